@@ -1,0 +1,6 @@
+function(velkui_set_warnings target)
+  target_compile_options(${target} PRIVATE -Wall -Wextra -Wpedantic)
+  if(VELKUI_WERROR)
+    target_compile_options(${target} PRIVATE -Werror)
+  endif()
+endfunction()
