@@ -1,0 +1,29 @@
+#pragma once
+
+// The whole drawing interface.
+#include <velkui/pictel/BasicSurfaceReferenceInterface.h>
+#include <velkui/pictel/BitmapCacheInterface.h>
+#include <velkui/pictel/BrushInterface.h>
+#include <velkui/pictel/CacheInterface.h>
+#include <velkui/pictel/ColorConversion.h>
+#include <velkui/pictel/ColorManagement.h>
+#include <velkui/pictel/FontInterface.h>
+#include <velkui/pictel/Gradients.h>
+#include <velkui/pictel/ImageInterface.h>
+#include <velkui/pictel/MemBuffer.h>
+#include <velkui/pictel/OSSupplier.h>
+#include <velkui/pictel/OSSurfaceP.h>
+#include <velkui/pictel/PathInterface.h>
+#include <velkui/pictel/PathShapes.h>
+#include <velkui/pictel/PenInterface.h>
+#include <velkui/pictel/Pictel.h>
+#include <velkui/pictel/PictelErrors.h>
+#include <velkui/pictel/PictelHandles.h>
+#include <velkui/pictel/PictelImageResourceCache.h>
+#include <velkui/pictel/PictelTypes.h>
+#include <velkui/pictel/PixelSwizzle.h>
+#include <velkui/pictel/RedrawDebug.h>
+#include <velkui/pictel/StartupShutdownGdiPlus.h>
+#include <velkui/pictel/StringTruncation.h>
+#include <velkui/pictel/SupplierInterface.h>
+#include <velkui/pictel/SurfaceInterface.h>
