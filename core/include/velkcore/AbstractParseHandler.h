@@ -71,7 +71,7 @@ class AbstractParseHandler {
 
   // The value of the named attribute, if the element has it.
   static std::optional<std::string_view> FindAttribute(std::span<const XMLAttribute> attributes,
-                                               std::string_view name);
+                                                       std::string_view name);
 
  private:
   friend struct ParseHandlerCallbacks;

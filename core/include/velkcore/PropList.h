@@ -9,9 +9,11 @@
 #include <string>
 #include <string_view>
 #include <type_traits>
+#include <utility>
 #include <variant>
 #include <vector>
 
+#include <velkcore/Error.h>
 #include <velkcore/Geometry.h>
 #include <velkcore/Strings.h>
 
@@ -86,7 +88,7 @@ class PropValue {
   }
   template <typename T>
   T* GetIf() {
-    return const_cast<T*>(std::as_const(*this).GetIf<T>());
+    return const_cast<T*>(std::as_const(*this).template GetIf<T>());
   }
 
   // Same type and same value; floating-point values compare by their bits, so
@@ -142,7 +144,9 @@ class PropList {
   void Set(std::string_view key, float value) { Put(key, PropValue(value)); }
   void Set(std::string_view key, double value) { Put(key, PropValue(value)); }
   void Set(std::string_view key, std::string value) { Put(key, PropValue(std::move(value))); }
-  void Set(std::string_view key, std::string_view value) { Put(key, PropValue(std::string(value))); }
+  void Set(std::string_view key, std::string_view value) {
+    Put(key, PropValue(std::string(value)));
+  }
   // A null pointer is an input-contract violation.
   void Set(std::string_view key, const char* value);
   void Set(std::string_view key, UTF16String value) { Put(key, PropValue(std::move(value))); }

@@ -1,0 +1,411 @@
+#include <velkcore/AbstractParseHandler.h>
+#include <velkcore/PropListXML.h>
+
+#include <bit>
+#include <cmath>
+#include <functional>
+#include <limits>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include <gtest/gtest.h>
+
+using namespace velkcore;
+
+namespace {
+
+std::optional<Exception> ErrorOf(const std::function<void()>& action) {
+  try {
+    action();
+  } catch (const Exception& e) {
+    return e;
+  }
+  return std::nullopt;
+}
+
+PropList RoundTrip(const PropList& list) {
+  return ReadPropList(WritePropList(list));
+}
+
+std::string Nested(std::size_t lists) {
+  std::string xml = "<prop.map version='4'>";
+  for (std::size_t i = 1; i < lists; ++i) xml += "<prop.list><prop.pair><key>k</key>";
+  xml += "<prop.list/>";
+  for (std::size_t i = 1; i < lists; ++i) xml += "</prop.pair></prop.list>";
+  return xml + "</prop.map>";
+}
+
+PropList NestedList(std::size_t lists) {
+  PropList root;
+  PropList* list = &root;
+  for (std::size_t i = 1; i < lists; ++i) list = list->NewSubList("k");
+  return root;
+}
+
+}  // namespace
+
+TEST(PropListXML, WritesTheStoredForm) {
+  PropList list;
+  list.Set("visible", true);
+  list.Set("off", false);
+  list.Set("count", -2);
+  list.Set("size", 7u);
+  list.Set("port", std::uint16_t{8080});
+  list.Set("ratio", 0.1f);
+  list.Set("precise", 0.1);
+  list.Set("name", "A&B <c>");
+  list.Set("title", u"Zoom\r\n");
+  list.Set("raw", std::string("\x01", 1));
+  list.Set("items", UTF16StringArray{u"one", u"two"});
+  list.NewSubList("empty");
+  list.NewSubList("bounds")->Set("left", 1);
+
+  EXPECT_EQ(WritePropList(list), R"(<?xml version="1.0" encoding="UTF-8"?>
+<prop.map version="4">
+  <prop.list>
+    <prop.pair>
+      <key>bounds</key>
+      <prop.list>
+        <prop.pair>
+          <key>left</key>
+          <int type="signed" size="32">1</int>
+        </prop.pair>
+      </prop.list>
+    </prop.pair>
+    <prop.pair>
+      <key>count</key>
+      <int type="signed" size="32">-2</int>
+    </prop.pair>
+    <prop.pair>
+      <key>empty</key>
+      <prop.list/>
+    </prop.pair>
+    <prop.pair>
+      <key>items</key>
+      <array>
+        <array.type><ustring/></array.type>
+        <ustring>one</ustring>
+        <ustring>two</ustring>
+      </array>
+    </prop.pair>
+    <prop.pair>
+      <key>name</key>
+      <string>A&amp;B &lt;c&gt;</string>
+    </prop.pair>
+    <prop.pair>
+      <key>off</key>
+      <false/>
+    </prop.pair>
+    <prop.pair>
+      <key>port</key>
+      <int type="unsigned" size="16">8080</int>
+    </prop.pair>
+    <prop.pair>
+      <key>precise</key>
+      <float size="64">0.1</float>
+    </prop.pair>
+    <prop.pair>
+      <key>ratio</key>
+      <float>0.1</float>
+    </prop.pair>
+    <prop.pair>
+      <key>raw</key>
+      <string encoding="hex">01</string>
+    </prop.pair>
+    <prop.pair>
+      <key>size</key>
+      <int type="unsigned" size="32">7</int>
+    </prop.pair>
+    <prop.pair>
+      <key>title</key>
+      <ustring>Zoom&#13;
+</ustring>
+    </prop.pair>
+    <prop.pair>
+      <key>visible</key>
+      <true/>
+    </prop.pair>
+  </prop.list>
+</prop.map>
+)");
+  EXPECT_EQ(RoundTrip(list), list);
+  EXPECT_EQ(WritePropList(PropList()),
+            "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<prop.map version=\"4\">\n"
+            "  <prop.list/>\n</prop.map>\n");
+}
+
+TEST(PropListXML, ExtremeNumbersReadBackBitExactly) {
+  using F = std::numeric_limits<float>;
+  using D = std::numeric_limits<double>;
+  const std::vector<float> floats = {0.0f,
+                                     -0.0f,
+                                     1.0f,
+                                     -1.0f,
+                                     0.1f,
+                                     1.0f / 3,
+                                     F::min(),
+                                     F::max(),
+                                     F::lowest(),
+                                     F::denorm_min(),
+                                     1e-40f,
+                                     F::epsilon(),
+                                     F::infinity(),
+                                     -F::infinity(),
+                                     F::quiet_NaN(),
+                                     -F::quiet_NaN(),
+                                     std::bit_cast<float>(0x7fa00001u),
+                                     std::bit_cast<float>(0xffc00123u)};
+  const std::vector<double> doubles = {0.0,
+                                       -0.0,
+                                       0.1,
+                                       1.0 / 3,
+                                       D::min(),
+                                       D::max(),
+                                       D::lowest(),
+                                       D::denorm_min(),
+                                       4.9e-320,
+                                       D::epsilon(),
+                                       16777217.0,
+                                       D::infinity(),
+                                       -D::infinity(),
+                                       D::quiet_NaN(),
+                                       -D::quiet_NaN(),
+                                       std::bit_cast<double>(0x7ff0000000000001ull),
+                                       std::bit_cast<double>(0xfff8000000000abcull)};
+  PropList list;
+  for (std::size_t i = 0; i < floats.size(); ++i) list.Set("f" + std::to_string(i), floats[i]);
+  for (std::size_t i = 0; i < doubles.size(); ++i) list.Set("d" + std::to_string(i), doubles[i]);
+  list.Set("i1", std::numeric_limits<std::int32_t>::min());
+  list.Set("i2", std::numeric_limits<std::int32_t>::max());
+  list.Set("u1", std::numeric_limits<std::uint32_t>::max());
+  list.Set("u2", 0u);
+  list.Set("s1", std::uint16_t{65535});
+  list.Set("s2", std::uint16_t{0});
+
+  const std::string xml = WritePropList(list);
+  EXPECT_NE(xml.find("<float>nan(0x7fa00001)</float>"), std::string::npos);
+  EXPECT_NE(xml.find("<float size=\"64\">-inf</float>"), std::string::npos);
+  EXPECT_NE(xml.find("<float>-nan</float>"), std::string::npos);
+  EXPECT_NE(xml.find(">-2147483648<"), std::string::npos);
+  EXPECT_EQ(ReadPropList(xml), list);  // equality compares the bits
+}
+
+TEST(PropListXML, EveryByteAndEveryCodeUnitSurvives) {
+  PropList list;
+  std::string allBytes;
+  UTF16StringArray allUnits;
+  for (int byte = 0; byte < 256; ++byte) {
+    allBytes.push_back(static_cast<char>(byte));
+    list.Set("b" + std::to_string(byte), std::string(1, static_cast<char>(byte)));
+  }
+  for (int unit = 0; unit <= 0xFFFF; ++unit) allUnits.emplace_back(1, static_cast<char16_t>(unit));
+  list.Set("allBytes", allBytes);
+  list.Set("allUnits", allUnits);
+  list.Set("surrogates", UTF16StringArray{u"\U0001F600",
+                                          {char16_t(0xDC00), char16_t(0xD800)},
+                                          {u'a', char16_t(0xD800)},
+                                          {char16_t(0xDFFF), u'b'}});
+  list.Set("nonCharacters", "\xEF\xBF\xBE \xEF\xBF\xBF");
+  list.Set("badUTF8", "\xC0\x80 \xED\xA0\x80 \xF4\x90\x80\x80 \xE2\x82");
+  list.Set("markup", "]]> <!-- &amp; --> <?pi?> <![CDATA[x]]>");
+  list.Set("spaces", u"  \t leading and trailing \n\n ");
+  list.Set("lineEnds", u"a\r\nb\rc\n\rd");
+  list.Set("", "empty key");
+  list.Set("key\r\n<&>", "awkward key");
+  list.Set(std::string("\0\x01\xFF", 3), "unwritable key");
+  list.Set("emptyString", "");
+  list.Set("emptyUString", u"");
+  list.Set("emptyArray", UTF16StringArray{});
+  list.Set("emptyItems", UTF16StringArray{u"", u""});
+
+  const std::string xml = WritePropList(list);
+  EXPECT_EQ(ReadPropList(xml), list);
+  EXPECT_NE(xml.find("<ustring>a&#13;\nb&#13;c\n&#13;d</ustring>"), std::string::npos)
+      << "carriage returns are kept without falling back to hex";
+  EXPECT_NE(xml.find("<key encoding=\"hex\">0001ff</key>"), std::string::npos);
+  EXPECT_NE(xml.find("<ustring encoding=\"hex\">dc00d800</ustring>"), std::string::npos);
+}
+
+TEST(PropListXML, ListsNestUpToTheLimit) {
+  const PropList deepest = NestedList(kMaxPropListDepth);
+  EXPECT_EQ(RoundTrip(deepest), deepest);
+  EXPECT_EQ(ReadPropList(Nested(kMaxPropListDepth)), deepest);
+
+  const auto readError = ErrorOf([] { ReadPropList(Nested(kMaxPropListDepth + 1)); });
+  ASSERT_TRUE(readError);
+  EXPECT_EQ(readError->GetKey(), kPropListTooDeepKey);
+  const std::size_t column = Nested(kMaxPropListDepth + 1).find("<prop.list/>") + 1;
+  EXPECT_EQ(readError->what(),
+            "Lists nest deeper than 256 levels at line 1, column " + std::to_string(column) + ".");
+
+  const auto writeError = ErrorOf([] { WritePropList(NestedList(kMaxPropListDepth + 1)); });
+  ASSERT_TRUE(writeError);
+  EXPECT_EQ(writeError->GetKey(), kPropListWriteTooDeepKey);
+}
+
+TEST(PropListXML, AcceptsEquivalentSpellings) {
+  const std::string xml =
+      "<?xml version='1.0' encoding='ISO-8859-1'?>\n"
+      "<!-- written by hand -->\n"
+      "<prop.map version='4'><?tool hint?><prop.list>\n"
+      "  <prop.pair><key>n</key><int size='32' type='signed'>\n  -12\t</int></prop.pair>\n"
+      "  <prop.pair><key>f</key><float size='32'> 2.5 </float></prop.pair>\n"
+      "  <prop.pair><key>d</key><float size='64'>1e300</float></prop.pair>\n"
+      "  <prop.pair><key>inf</key><float>Infinity</float></prop.pair>\n"
+      "  <prop.pair><key>s</key><string/></prop.pair>\n"
+      "  <prop.pair><key>latin</key><ustring>caf\xE9</ustring></prop.pair>\n"
+      "  <prop.pair><key>hex</key><ustring encoding='hex'>00410042</ustring></prop.pair>\n"
+      "  <prop.pair><key>HEX</key><string encoding='hex'>4A4b</string></prop.pair>\n"
+      "  <prop.pair><key>t</key><true>  </true></prop.pair>\n"
+      "</prop.list></prop.map>\n";
+  const std::vector<unsigned char> bytes(xml.begin(), xml.end());
+  const PropList list = ReadPropList(std::span<const unsigned char>(bytes));
+  PropList expected;
+  expected.Set("n", -12);
+  expected.Set("f", 2.5f);
+  expected.Set("d", 1e300);
+  expected.Set("inf", std::numeric_limits<float>::infinity());
+  expected.Set("s", "");
+  expected.Set("latin", u"caf\u00E9");
+  expected.Set("hex", u"AB");
+  expected.Set("HEX", "JK");
+  expected.Set("t", true);
+  EXPECT_EQ(list, expected);
+}
+
+TEST(PropListXML, MalformedDocumentsRaiseWithLineAndColumn) {
+  struct Case {
+    std::string xml;
+    std::string_view key;
+    std::string where;
+  };
+  const std::vector<Case> cases = {
+      {"", kMalformedXMLKey, "line 1, column 1"},
+      {"not xml", kMalformedXMLKey, "line 1, column 1"},
+      {"<prop.map version='4'>\n<prop.list>\n<prop.pair>", kMalformedXMLKey, "line 3, column 12"},
+      {"<prop.map version='4'><prop.list/></prop.map>tail", kMalformedXMLKey, "line 1, column 46"},
+      {"<!DOCTYPE prop.map><prop.map version='4'><prop.list/></prop.map>", kXMLDoctypeNotAllowedKey,
+       "line 1, column 1"},
+      {"<prop.mop version='4'><prop.list/></prop.mop>", kPropListUnexpectedElementKey,
+       "line 1, column 1"},
+      {"<prop.map version='3'><prop.list/></prop.map>", kPropListBadAttributeKey,
+       "line 1, column 1"},
+      {"<prop.map><prop.list/></prop.map>", kPropListMissingAttributeKey, "line 1, column 1"},
+      {"\n  <prop.map version='4'></prop.map>", kPropListMissingPartKey, "line 2, column 3"},
+      {"<prop.map version='4'><prop.list/><prop.list/></prop.map>", kPropListUnexpectedElementKey,
+       "line 1, column 35"},
+  };
+  for (const Case& c : cases) {
+    const auto error = ErrorOf([&] { ReadPropList(c.xml); });
+    ASSERT_TRUE(error) << c.xml;
+    EXPECT_EQ(error->GetKey(), c.key) << c.xml;
+    EXPECT_NE(std::string(error->what()).find(c.where), std::string::npos)
+        << c.xml << " -> " << error->what();
+  }
+}
+
+// Each body sits on line 3 of a document; the error points at `at`.
+TEST(PropListXML, BadPairsRaiseWithLineAndColumn) {
+  struct Case {
+    std::string body;
+    std::string_view key;
+    std::string at;
+  };
+  const std::string pair = "<prop.pair><key>a</key>";
+  const std::vector<Case> cases = {
+      {"<prop.pair><true/></prop.pair>", kPropListMissingPartKey, "<prop.pair>"},
+      {pair + "</prop.pair>", kPropListMissingPartKey, "<prop.pair>"},
+      {pair + "<true/><false/></prop.pair>", kPropListUnexpectedElementKey, "<false/>"},
+      {pair + "<key>b</key></prop.pair>", kPropListUnexpectedElementKey, "<key>b"},
+      {pair + "<date>1</date></prop.pair>", kPropListUnexpectedElementKey, "<date>"},
+      {"<key>a</key>", kPropListUnexpectedElementKey, "<key>"},
+      {"junk" + pair + "<true/></prop.pair>", kPropListUnexpectedTextKey, "junk"},
+      {"<prop.pair id='1'><key>a</key><true/></prop.pair>", kPropListUnexpectedAttributeKey,
+       "<prop.pair"},
+      {pair + "<prop.list x='1'/></prop.pair>", kPropListUnexpectedAttributeKey, "<prop.list"},
+      {pair + "<true/></prop.pair>" + pair + "<false/></prop.pair>", kPropListDuplicateKeyKey,
+       "<key>a</key><false/>"},
+      {pair + "<int type='signed' size='64'>1</int></prop.pair>", kPropListBadAttributeKey, "<int"},
+      {pair + "<int type='signed' size='16'>1</int></prop.pair>", kPropListBadAttributeKey, "<int"},
+      {pair + "<int type='float' size='32'>1</int></prop.pair>", kPropListBadAttributeKey, "<int"},
+      {pair + "<int size='32'>1</int></prop.pair>", kPropListMissingAttributeKey, "<int"},
+      {pair + "<int type='signed'>1</int></prop.pair>", kPropListMissingAttributeKey, "<int"},
+      {pair + "<int type='signed' size='32' base='16'>1</int></prop.pair>",
+       kPropListUnexpectedAttributeKey, "<int"},
+      {pair + "<int type='signed' size='32'>12x</int></prop.pair>", kPropListBadNumberKey, "<int"},
+      {pair + "<int type='signed' size='32'></int></prop.pair>", kPropListBadNumberKey, "<int"},
+      {pair + "<int type='signed' size='32'>+5</int></prop.pair>", kPropListBadNumberKey, "<int"},
+      {pair + "<int type='signed' size='32'>-2147483649</int></prop.pair>", kPropListBadNumberKey,
+       "<int"},
+      {pair + "<int type='unsigned' size='32'>4294967296</int></prop.pair>", kPropListBadNumberKey,
+       "<int"},
+      {pair + "<int type='unsigned' size='32'>-1</int></prop.pair>", kPropListBadNumberKey, "<int"},
+      {pair + "<int type='unsigned' size='16'>65536</int></prop.pair>", kPropListBadNumberKey,
+       "<int"},
+      {pair + "<float>abc</float></prop.pair>", kPropListBadNumberKey, "<float"},
+      {pair + "<float>1e39</float></prop.pair>", kPropListBadNumberKey, "<float"},
+      {pair + "<float>0x1p3</float></prop.pair>", kPropListBadNumberKey, "<float"},
+      {pair + "<float>nan(0x3f800000)</float></prop.pair>", kPropListBadNumberKey, "<float"},
+      {pair + "<float>-nan(0x7fc00001)</float></prop.pair>", kPropListBadNumberKey, "<float"},
+      {pair + "<float size='64'>nan(0x)</float></prop.pair>", kPropListBadNumberKey, "<float"},
+      {pair + "<float size='64'>nan(0x7ff00000000000001)</float></prop.pair>",
+       kPropListBadNumberKey, "<float"},
+      {pair + "<float size='16'>1</float></prop.pair>", kPropListBadAttributeKey, "<float"},
+      {pair + "<true>yes</true></prop.pair>", kPropListUnexpectedTextKey, "yes"},
+      {pair + "<true><b/></true></prop.pair>", kPropListUnexpectedElementKey, "<b/>"},
+      {pair + "<string>a<b/></string></prop.pair>", kPropListUnexpectedElementKey, "<b/>"},
+      {pair + "<string encoding='base64'>AA==</string></prop.pair>", kPropListBadAttributeKey,
+       "<string"},
+      {pair + "<string encoding='hex'>abc</string></prop.pair>", kPropListBadEncodedTextKey,
+       "<string"},
+      {pair + "<string encoding='hex'>zz</string></prop.pair>", kPropListBadEncodedTextKey,
+       "<string"},
+      {pair + "<ustring encoding='hex'>00410</ustring></prop.pair>", kPropListBadEncodedTextKey,
+       "<ustring"},
+      {"<prop.pair><key encoding='hex'>g0</key><true/></prop.pair>", kPropListBadEncodedTextKey,
+       "<key"},
+      {pair + "<array><ustring>a</ustring></array></prop.pair>", kPropListMissingPartKey,
+       "<array>"},
+      {pair + "<array></array></prop.pair>", kPropListMissingPartKey, "<array>"},
+      {pair + "<array><array.type><string/></array.type></array></prop.pair>",
+       kPropListUnexpectedElementKey, "<string/>"},
+      {pair + "<array><array.type></array.type></array></prop.pair>", kPropListMissingPartKey,
+       "<array.type>"},
+      {pair + "<array><array.type><ustring/><ustring/></array.type></array></prop.pair>",
+       kPropListUnexpectedElementKey, "<ustring/></array.type>"},
+      {pair + "<array><array.type><ustring encoding='hex'/></array.type></array></prop.pair>",
+       kPropListUnexpectedAttributeKey, "<ustring"},
+      {pair + "<array><array.type><ustring/></array.type><string>a</string></array></prop.pair>",
+       kPropListUnexpectedElementKey, "<string>"},
+  };
+  for (const Case& c : cases) {
+    const std::string xml =
+        "<prop.map version='4'>\n<prop.list>\n" + c.body + "\n</prop.list>\n</prop.map>";
+    const auto error = ErrorOf([&] { ReadPropList(xml); });
+    ASSERT_TRUE(error) << c.body;
+    EXPECT_EQ(error->GetKey(), c.key) << c.body;
+    const std::size_t column = c.body.find(c.at) + 1;
+    const std::string where = "line 3, column " + std::to_string(column);
+    EXPECT_NE(std::string(error->what()).find(where), std::string::npos)
+        << c.body << " -> " << error->what() << " (expected " << where << ")";
+  }
+}
+
+TEST(PropListXML, MessagesNameWhatIsWrong) {
+  const std::string head = "<prop.map version='4'><prop.list><prop.pair><key>a</key>";
+  const std::string tail = "</prop.pair></prop.list></prop.map>";
+  auto message = [&](const std::string& value) {
+    const auto error = ErrorOf([&] { ReadPropList(head + value + tail); });
+    return error ? std::string(error->what()) : std::string("no error");
+  };
+  EXPECT_EQ(message("<int type='unsigned' size='16'>65536</int>"),
+            "The text '65536' at line 1, column 57 is not a valid uint16.");
+  EXPECT_EQ(message("<float size='8'>1</float>"),
+            "Unknown value '8' of attribute 'size' at line 1, column 57.");
+  EXPECT_EQ(message("<array></array>"),
+            "The <array> element at line 1, column 57 lacks its array.type.");
+  EXPECT_EQ(
+      message("<float>" + std::string(1000, '9') + "x</float>"),
+      "The text '" + std::string(40, '9') + "...' at line 1, column 57 is not a valid float.");
+}
