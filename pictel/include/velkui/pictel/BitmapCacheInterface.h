@@ -20,6 +20,7 @@ class BitmapCacheInterface : public CacheInterface {
   ~BitmapCacheInterface() override;
 
   SurfaceInterface* GetSurface() override { return cacheSurface_.get(); }
+  SurfaceInterface* GetCacheSurface() const { return cacheSurface_.get(); }
   bool IsValid(const SurfaceInterface& surface, const velkcore::RectT<float>& rect) const override;
 
   const velkcore::RectT<float>& GetRect() const { return rect_; }

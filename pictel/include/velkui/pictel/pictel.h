@@ -9,6 +9,7 @@
 #include <velkui/pictel/ColorManagement.h>
 #include <velkui/pictel/FontInterface.h>
 #include <velkui/pictel/Gradients.h>
+#include <velkui/pictel/ImageIO.h>
 #include <velkui/pictel/ImageInterface.h>
 #include <velkui/pictel/MemBuffer.h>
 #include <velkui/pictel/OSSupplier.h>
