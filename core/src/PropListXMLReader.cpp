@@ -47,6 +47,13 @@ struct Frame {
   UTF16StringArray items;                  // kArray
 };
 
+// Document text quoted in a message, cut short so the message stays readable.
+std::string Shown(std::string_view text) {
+  constexpr std::size_t kLongest = 40;
+  if (text.size() <= kLongest) return std::string(text);
+  return std::string(text.substr(0, kLongest)) + "...";
+}
+
 // Leaves carry text; every other element holds only elements and white space.
 bool IsLeaf(Node node) {
   return node == Node::kKey || node == Node::kNumber || node == Node::kString ||
@@ -253,7 +260,7 @@ class PropListReader final : public AbstractParseHandler {
   void EndKey(const Frame& keyFrame, Frame& pair) {
     std::string key = DecodeBytes(keyFrame);
     if (pair.list->HasKey(key)) {
-      RaiseAt(keyFrame.start, kPropListDuplicateKeyKey, kPropListDuplicateKeyNumber, key);
+      RaiseAt(keyFrame.start, kPropListDuplicateKeyKey, kPropListDuplicateKeyNumber, Shown(key));
     }
     pair.key = std::move(key);
     pair.hasKey = true;
@@ -282,11 +289,7 @@ class PropListReader final : public AbstractParseHandler {
   template <typename T>
   PropValue Parsed(const Frame& frame, const std::optional<T>& number) const {
     if (!number) {
-      // Keep the message readable whatever the document holds.
-      constexpr std::size_t kShown = 40;
-      const std::string shown =
-          text_.size() > kShown ? text_.substr(0, kShown) + "..." : std::string(text_);
-      RaiseAt(frame.start, kPropListBadNumberKey, kPropListBadNumberNumber, shown,
+      RaiseAt(frame.start, kPropListBadNumberKey, kPropListBadNumberNumber, Shown(text_),
               PropTypeName(frame.numberType));
     }
     return PropValue(*number);
@@ -314,7 +317,7 @@ class PropListReader final : public AbstractParseHandler {
     for (const XMLAttribute& attribute : attributes) {
       if (std::find(allowed.begin(), allowed.end(), attribute.name) == allowed.end()) {
         RaiseAt(where, kPropListUnexpectedAttributeKey, kPropListUnexpectedAttributeNumber,
-                attribute.name);
+                Shown(attribute.name));
       }
     }
   }
@@ -354,12 +357,12 @@ class PropListReader final : public AbstractParseHandler {
   // ---- errors ----
 
   [[noreturn]] static void RaiseUnexpectedElement(std::string_view name, const XMLPosition& where) {
-    RaiseAt(where, kPropListUnexpectedElementKey, kPropListUnexpectedElementNumber, name);
+    RaiseAt(where, kPropListUnexpectedElementKey, kPropListUnexpectedElementNumber, Shown(name));
   }
 
   [[noreturn]] static void RaiseBadAttribute(std::string_view name, std::string_view value,
                                              const XMLPosition& where) {
-    RaiseAt(where, kPropListBadAttributeKey, kPropListBadAttributeNumber, name, value);
+    RaiseAt(where, kPropListBadAttributeKey, kPropListBadAttributeNumber, name, Shown(value));
   }
 
   [[noreturn]] static void RaiseMissingPart(const Frame& frame, std::string_view part) {

@@ -145,14 +145,14 @@ TEST_F(FileTest, ByteStreamReadsExactRanges) {
   stream->ReadBlock(10, buffer, 0);
 
   std::fill(std::begin(buffer), std::end(buffer), 'x');
-  for (const auto& [offset, count] : std::vector<std::pair<std::uint64_t, std::size_t>>{
+  for (const auto& range : std::vector<std::pair<std::uint64_t, std::size_t>>{
            {8, 3},
            {11, 0},
            {0, 11},
            {std::numeric_limits<std::uint64_t>::max(), 2},
            {2, std::numeric_limits<std::size_t>::max()}}) {
-    const auto error = ErrorOf([&] { stream->ReadBlock(offset, buffer, count); });
-    ASSERT_TRUE(error) << offset << "+" << count;
+    const auto error = ErrorOf([&] { stream->ReadBlock(range.first, buffer, range.second); });
+    ASSERT_TRUE(error) << range.first << "+" << range.second;
     EXPECT_EQ(error->GetKey(), kFileReadOutOfRangeKey);
   }
   EXPECT_EQ(std::string(buffer, 10), std::string(10, 'x')) << "nothing is read";

@@ -3,6 +3,8 @@
 
 #include <bit>
 #include <cmath>
+#include <filesystem>
+#include <fstream>
 #include <functional>
 #include <limits>
 #include <optional>
@@ -408,4 +410,27 @@ TEST(PropListXML, MessagesNameWhatIsWrong) {
   EXPECT_EQ(
       message("<float>" + std::string(1000, '9') + "x</float>"),
       "The text '" + std::string(40, '9') + "...' at line 1, column 57 is not a valid float.");
+}
+
+// What the fuzz target checks, over its seed corpus: every input either raises
+// or reads as a list that writes back to text reading as the same list.
+TEST(PropListXML, SeedCorpusKeepsTheFuzzInvariant) {
+  const std::filesystem::path corpus =
+      std::filesystem::path(VELKUI_TEST_DATA_DIR) / ".." / "fuzz" / "corpus" / "proplist";
+  std::size_t inputs = 0;
+  for (const auto& entry : std::filesystem::directory_iterator(corpus)) {
+    std::ifstream in(entry.path(), std::ios::binary);
+    const std::string input(std::istreambuf_iterator<char>(in), {});
+    ++inputs;
+    std::optional<PropList> list;
+    try {
+      list = ReadPropList(input);
+    } catch (const Exception&) {
+      continue;
+    }
+    const std::string written = WritePropList(*list);
+    EXPECT_EQ(ReadPropList(written), *list) << entry.path();
+    EXPECT_EQ(WritePropList(ReadPropList(written)), written) << entry.path();
+  }
+  EXPECT_GE(inputs, 5u);
 }
