@@ -36,6 +36,11 @@ void OSPathInterface::AddPoint(double x, double y) {
   data_.push_back(point);
 }
 
+void OSPathInterface::NoteSegment(double x0, double y0, double x1, double y1) {
+  spansX_ = spansX_ || x0 != x1;
+  spansY_ = spansY_ || y0 != y1;
+}
+
 void OSPathInterface::MoveTo(const PointT<float>& point) {
   RequireFinite(point);
   ClearWholeNumbered();
@@ -53,6 +58,7 @@ void OSPathInterface::LineTo(const PointT<float>& point) {
     return;
   }
   ClearWholeNumbered();
+  NoteSegment(current_.x, current_.y, point.x, point.y);
   AddHeader(CAIRO_PATH_LINE_TO, 2);
   AddPoint(point.x, point.y);
   current_ = {point.x, point.y};
@@ -66,6 +72,7 @@ void OSPathInterface::BezierTo(const PointT<float>& control1, const PointT<float
   RequireFinite(end);
   if (!hasCurrentPoint_) MoveTo(control1);
   ClearWholeNumbered();
+  spansX_ = spansY_ = true;
   AddHeader(CAIRO_PATH_CURVE_TO, 4);
   AddPoint(control1.x, control1.y);
   AddPoint(control2.x, control2.y);
@@ -118,6 +125,7 @@ void OSPathInterface::AddArcSegment(double cx, double cy, double radius, double 
   const double y0 = cy + radius * std::sin(from);
   const double x3 = cx + radius * std::cos(to);
   const double y3 = cy + radius * std::sin(to);
+  spansX_ = spansY_ = true;
   AddHeader(CAIRO_PATH_CURVE_TO, 4);
   AddPoint(x0 - k * std::sin(from), y0 + k * std::cos(from));
   AddPoint(x3 + k * std::sin(to), y3 - k * std::cos(to));
@@ -127,6 +135,7 @@ void OSPathInterface::AddArcSegment(double cx, double cy, double radius, double 
 
 void OSPathInterface::Close() {
   if (!figureOpen_) return;
+  NoteSegment(current_.x, current_.y, figureStart_.x, figureStart_.y);
   AddHeader(CAIRO_PATH_CLOSE_PATH, 1);
   current_ = figureStart_;
   figureOpen_ = false;

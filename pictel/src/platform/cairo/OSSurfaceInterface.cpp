@@ -268,9 +268,10 @@ void OSSurfaceInterface::StrokePath(const PenInterface& pen, const PathInterface
   cairo_get_matrix(context, &matrix);
   const bool axisAligned = matrix.xy == 0.0 && matrix.yx == 0.0;
   if (figures.IsWholeNumbered() && axisAligned) {
+    // Only across the segments: a horizontal line keeps its ends on pixel edges.
     cairo_matrix_t shifted = matrix;
-    shifted.x0 += HalfPixelShift(osPen.GetWidth() * std::fabs(matrix.xx));
-    shifted.y0 += HalfPixelShift(osPen.GetWidth() * std::fabs(matrix.yy));
+    if (figures.SpansY()) shifted.x0 += HalfPixelShift(osPen.GetWidth() * std::fabs(matrix.xx));
+    if (figures.SpansX()) shifted.y0 += HalfPixelShift(osPen.GetWidth() * std::fabs(matrix.yy));
     cairo_set_matrix(context, &shifted);
     figures.AppendTo(context);
     cairo_set_matrix(context, &matrix);
