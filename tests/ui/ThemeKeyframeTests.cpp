@@ -41,13 +41,13 @@ void ExpectColorNear(const ColorRGBA& actual, const ColorRGBA& expected) {
   EXPECT_NEAR(actual.alpha, expected.alpha, 1e-5);
 }
 
-TEST(KeyframeInterpolationTest, ValueAndAlphaFollowTheBrightnessBetweenKeys) {
+TEST(KeyframeInterpolationTest, BetweenKeysValueAndAlphaFollowTheBrightness) {
   Editor editor;
+  EXPECT_EQ(editor.At(kIndex, 0.5f), (ColorRGBA{0.25f, 0.5f, 0.75f, 0.125f}));  // no keys
   editor.SetColorKeyValue(kIndex, 0.0f, {0, 0, 0.2f, 1.0f, false});
   editor.SetColorKeyValue(kIndex, 1.0f, {0, 0, 0.8f, 0.5f, false});
   ExpectColorNear(editor.At(kIndex, 0.5f), {0.5f, 0.5f, 0.5f, 0.75f});
   ExpectColorNear(editor.At(kIndex, 0.25f), {0.35f, 0.35f, 0.35f, 0.875f});
-  ExpectColorNear(editor.At(kIndex, 0.0f), {0.2f, 0.2f, 0.2f, 1.0f});
 }
 
 TEST(KeyframeInterpolationTest, HoldKeepsTheKeyColourUpToTheNextKey) {
@@ -68,11 +68,6 @@ TEST(KeyframeInterpolationTest, OutsideTheKeysTheNearestEndKeyHolds) {
   EXPECT_EQ(editor.At(kIndex, -50.0f), first);
   ExpectColorNear(editor.At(kIndex, 0.7f), GreyColor(0.9f));
   ExpectColorNear(editor.At(kIndex, 3.0f), GreyColor(0.9f));
-
-  Editor single;
-  single.SetColorKeyValue(kIndex, 0.5f, Grey(0.6f));
-  ExpectColorNear(single.At(kIndex, 0.0f), GreyColor(0.6f));
-  ExpectColorNear(single.At(kIndex, 1.0f), GreyColor(0.6f));
 }
 
 TEST(KeyframeInterpolationTest, HueAndSaturationFollowTheInterpolatedValue) {
@@ -85,7 +80,7 @@ TEST(KeyframeInterpolationTest, HueAndSaturationFollowTheInterpolatedValue) {
   ExpectColorNear(editor.At(kIndex, 0.0f), pictel::HSBtoRGB(20.0f, 0.28f, 0.2f, 1.0f));
 }
 
-TEST(KeyframeInterpolationTest, HueIsTruncatedAndReducedComponentsClamped) {
+TEST(KeyframeInterpolationTest, HueIsTruncatedAndOtherComponentsClamped) {
   Editor editor;
   editor.SetColorKeyValue(1, 0.0f, {370.9f, 1, 1, 1, false});
   EXPECT_EQ(editor.At(1, 0.5f), pictel::HSBtoRGB(10.0f, 1.0f, 1.0f, 1.0f));
@@ -93,26 +88,14 @@ TEST(KeyframeInterpolationTest, HueIsTruncatedAndReducedComponentsClamped) {
   EXPECT_EQ(editor.At(2, 0.5f), pictel::HSBtoRGB(-30.0f, 1.0f, 1.0f, 1.0f));
   editor.SetColorKeyValue(3, 0.0f, {60, 1.5f, 2.0f, -0.25f, false});
   EXPECT_EQ(editor.At(3, 0.5f), pictel::HSBtoRGB(60.0f, 1.0f, 1.0f, 0.0f));
-  editor.SetColorKeyValue(5, 0.0f, {1e30f, 1, 1, 1, false});
-  EXPECT_TRUE(std::isfinite(editor.At(5, 0.5f).red));
-}
 
-TEST(KeyframeInterpolationTest, KeysAlmostTogetherStayFinite) {
-  Editor editor;
-  editor.SetColorKeyValue(kIndex, 0.0f, {0, 0.5f, 0.5f, 1, false});
-  editor.SetColorKeyValue(kIndex, 1e-38f, {90, 0.7f, 0.5f, 1, false});
-  const ColorRGBA c = editor.At(kIndex, 5e-39f);
+  // Keys a denormal apart overflow the hue's parameter; the colour stays valid.
+  editor.SetColorKeyValue(5, 0.0f, {0, 0.5f, 0.5f, 1, false});
+  editor.SetColorKeyValue(5, 1e-38f, {90, 0.7f, 0.5f, 1, false});
+  const ColorRGBA c = editor.At(5, 5e-39f);
   for (const float component : {c.red, c.green, c.blue, c.alpha}) {
     EXPECT_TRUE(component >= 0 && component <= 1) << component;
   }
-}
-
-TEST(KeyframeInterpolationTest, WithoutKeysNothingIsWritten) {
-  Editor editor;
-  EXPECT_EQ(editor.At(kIndex, 0.5f), (ColorRGBA{0.25f, 0.5f, 0.75f, 0.125f}));
-  editor.SetColorTrack(kIndex, {});
-  EXPECT_TRUE(editor.HasColorTrack(kIndex));
-  EXPECT_EQ(editor.At(kIndex, 0.5f), (ColorRGBA{0.25f, 0.5f, 0.75f, 0.125f}));
 }
 
 TEST(KeyframeBrightnessTest, TracksOverrideThePaletteExceptIndependentOrEmptyOnes) {
@@ -129,77 +112,46 @@ TEST(KeyframeBrightnessTest, TracksOverrideThePaletteExceptIndependentOrEmptyOne
   EXPECT_EQ(editor.GetColor(2), GetDefaultThemeColor(2));
   EXPECT_EQ(editor.GetColor(3), GetDefaultThemeColor(3));
   ExpectColorNear(editor.GetColor(400), GreyColor(0.3f));
-  EXPECT_EQ(editor.GetColor(6), GetDefaultThemeColor(6));
 
-  EXPECT_TRUE(editor.GetIndependent(2));
   editor.SetIndependent(2, false);
-  EXPECT_FALSE(editor.GetIndependent(2));
   editor.ClearColorKeyValue(1);
-  EXPECT_FALSE(editor.HasColorTrack(1));
   editor.Update();
   ExpectColorNear(editor.GetColor(2), GreyColor(0.0f));
   EXPECT_EQ(editor.GetColor(1), GetDefaultThemeColor(1));
-
   editor.ClearColorKeyValues();
   editor.Update();
   EXPECT_EQ(editor.GetColor(2), GetDefaultThemeColor(2));
-  EXPECT_FALSE(editor.HasColorTrack(400));
 }
 
-TEST(KeyframeTrackTest, TracksAreSetReplacedAndChecked) {
+TEST(KeyframeTrackTest, NonFiniteKeysAreRefusedAndChangeNothing) {
   KeyframeThemeEditor editor;
-  EXPECT_TRUE(editor.GetColorTrack(kIndex).empty());
-  EXPECT_FALSE(editor.HasColorTrack(kIndex));
-
-  const KeyframeThemeEditor::ColorTrack track{{0.0f, Grey(0.1f)}, {1.0f, Grey(0.9f, true)}};
-  editor.SetColorTrack(kIndex, track);
-  EXPECT_EQ(editor.GetColorTrack(kIndex), track);
-  editor.SetColorKeyValue(kIndex, 1.0f, Grey(0.5f));
-  EXPECT_EQ(editor.GetColorTrack(kIndex).at(1.0f), Grey(0.5f));
-  EXPECT_EQ(editor.GetColorTrack(kIndex).size(), 2u);
-
+  editor.SetColorKeyValue(kIndex, 0.0f, Grey(0.1f));
   EXPECT_THROW(editor.SetColorKeyValue(kIndex, std::nanf(""), Grey(0.5f)), velkcore::Exception);
-  EXPECT_THROW(editor.SetColorKeyValue(kIndex, 0.5f, {INFINITY, 0, 0.5f, 1, false}),
+  EXPECT_THROW(editor.SetColorTrack(kIndex, {{0.2f, Grey(0.1f)}, {0.3f, {INFINITY, 0, 0, 1}}}),
                velkcore::Exception);
-  EXPECT_THROW(editor.SetColorTrack(kIndex, {{0.2f, Grey(0.1f)}, {INFINITY, Grey(0.3f)}}),
-               velkcore::Exception);
-  EXPECT_EQ(editor.GetColorTrack(kIndex).size(), 2u);
-
-  EXPECT_FALSE(editor.GetStrictMode());
-  editor.SetStrictMode(true);
-  EXPECT_TRUE(editor.GetStrictMode());
+  EXPECT_EQ(editor.GetColorTrack(kIndex), (KeyframeThemeEditor::ColorTrack{{0.0f, Grey(0.1f)}}));
 }
 
 TEST(KeyframeSourceBrightnessTest, FindsWhereTheTrackReachesTheColoursValue) {
   Editor editor;
   EXPECT_EQ(editor.GetSourceBrightness(kIndex, GreyColor(0.3f)), GetDefaultBrightness());
-
   editor.SetColorKeyValue(kIndex, 0.0f, Grey(0.2f));
   editor.SetColorKeyValue(kIndex, 1.0f, Grey(0.8f));
-  EXPECT_NEAR(editor.GetSourceBrightness(kIndex, GreyColor(0.5f)), 0.5f, 1e-6);
-  EXPECT_NEAR(editor.GetSourceBrightness(kIndex, GreyColor(0.2f)), 0.0f, 1e-6);
-  EXPECT_NEAR(editor.GetSourceBrightness(kIndex, GreyColor(0.8f)), 1.0f, 1e-6);
-  // Never reached: the key that comes closest.
-  EXPECT_EQ(editor.GetSourceBrightness(kIndex, GreyColor(0.05f)), 0.0f);
-  EXPECT_EQ(editor.GetSourceBrightness(kIndex, GreyColor(1.0f)), 1.0f);
-
-  for (const float b : {0.1f, 0.35f, 0.6f, 0.95f}) {
+  for (const float b : {0.0f, 0.35f, 0.6f, 1.0f}) {
     EXPECT_NEAR(editor.GetSourceBrightness(kIndex, editor.At(kIndex, b)), b, 1e-5) << b;
   }
   // The value of a colour is its brightest component.
   EXPECT_NEAR(editor.GetSourceBrightness(kIndex, {0.5f, 0.1f, 0.0f, 1}), 0.5f, 1e-6);
-}
+  // Never reached: the key that comes closest.
+  EXPECT_EQ(editor.GetSourceBrightness(kIndex, GreyColor(0.05f)), 0.0f);
+  EXPECT_EQ(editor.GetSourceBrightness(kIndex, GreyColor(1.0f)), 1.0f);
 
-TEST(KeyframeSourceBrightnessTest, HeldAndFallingTracks) {
-  Editor editor;
-  editor.SetColorKeyValue(kIndex, 0.2f, Grey(0.9f, true));
-  editor.SetColorKeyValue(kIndex, 0.6f, Grey(0.5f));
-  editor.SetColorKeyValue(kIndex, 1.0f, Grey(0.1f));
-  EXPECT_EQ(editor.GetSourceBrightness(kIndex, GreyColor(0.9f)), 0.2f);
-  EXPECT_NEAR(editor.GetSourceBrightness(kIndex, GreyColor(0.3f)), 0.8f, 1e-6);
-  // 0.7 lies in the jump at the end of the held stretch: the closest key.
-  const float jump = editor.GetSourceBrightness(kIndex, GreyColor(0.7f));
-  EXPECT_TRUE(jump == 0.2f || jump == 0.6f) << jump;
+  Editor falling;
+  falling.SetColorKeyValue(kIndex, 0.2f, Grey(0.9f, true));
+  falling.SetColorKeyValue(kIndex, 0.6f, Grey(0.5f));
+  falling.SetColorKeyValue(kIndex, 1.0f, Grey(0.1f));
+  EXPECT_EQ(falling.GetSourceBrightness(kIndex, GreyColor(0.9f)), 0.2f);
+  EXPECT_NEAR(falling.GetSourceBrightness(kIndex, GreyColor(0.3f)), 0.8f, 1e-6);
 }
 
 }  // namespace
