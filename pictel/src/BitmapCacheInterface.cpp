@@ -59,6 +59,7 @@ BitmapCacheInterface::BitmapCacheInterface(SurfaceInterface& surface, const Rect
       antiAlias_(surface.GetAntiAliasPolicy()),
       interpolation_(surface.GetInterpolationPolicy()) {
   surface.GetTransform(&transform_);
+  if (rect.IsEmpty()) return;
   const RectT<std::int32_t> pixels = DevicePixelBounds(rect, transform_);
   if (pixels.IsEmpty()) return;
   pixelBounds_ = pixels;

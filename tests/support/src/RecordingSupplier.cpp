@@ -23,8 +23,8 @@ std::string Spell(float value) {
 }
 
 std::string Spell(const ColorRGBA& color) {
-  return "(" + Spell(color.red) + "," + Spell(color.green) + "," + Spell(color.blue) +
-         "," + Spell(color.alpha) + ")";
+  return "(" + Spell(color.red) + "," + Spell(color.green) + "," + Spell(color.blue) + "," +
+         Spell(color.alpha) + ")";
 }
 
 std::string Spell(const RectT<float>& rect) {
@@ -72,7 +72,9 @@ RectT<std::int32_t> DeviceBounds(const RectT<float>& rect, const MatrixT<float>&
           static_cast<std::int32_t>(std::ceil(bottom)) - t};
 }
 
-std::string UTF8(const char16_t* text) { return velkcore::UTF16to8(text); }
+std::string UTF8(const char16_t* text) {
+  return velkcore::UTF16to8(text);
+}
 
 // Runs a buffer's deleter when the last user of the pixels goes.
 std::shared_ptr<void> PixelOwner(void* pixels, BufferDeleter deleter) {
@@ -89,9 +91,8 @@ std::string RecordedCall::ToString() const {
 
 std::vector<std::string> CallLog::Strings(int surface, bool drawingOnly) const {
   static const std::vector<std::string> bookkeeping = {
-      "PushStateStack",         "PopStateStack",       "Transform",
-      "Clip",                   "SetAntiAliasPolicy",  "SetInterpolationPolicy",
-      "SetTextDisplayPolicy",   "Flush"};
+      "PushStateStack",         "PopStateStack",        "Transform", "Clip", "SetAntiAliasPolicy",
+      "SetInterpolationPolicy", "SetTextDisplayPolicy", "Flush"};
   std::vector<std::string> out;
   for (const auto& call : calls_) {
     if (surface != 0 && call.surface != surface) continue;
@@ -150,7 +151,8 @@ void RecordingPath::BezierTo(const PointT<float>& c1, const PointT<float>& c2,
 
 void RecordingPath::AddRect(const RectT<float>& rect) {
   ClearWholeNumbered();
-  segments_.push_back("R" + Spell(rect));
+  const std::string spelled = Spell(rect);
+  segments_.push_back("R" + spelled.substr(1, spelled.size() - 2));
   Include(rect.left, rect.top);
   Include(rect.Right(), rect.Bottom());
 }
@@ -158,13 +160,15 @@ void RecordingPath::AddRect(const RectT<float>& rect) {
 void RecordingPath::AddArc(const PointT<float>& centre, float radius, float startAngle,
                            float sweepAngle) {
   ClearWholeNumbered();
-  segments_.push_back("A" + Spell(centre) + " " + Spell(radius) + " " +
-                      Spell(startAngle) + " " + Spell(sweepAngle));
+  segments_.push_back("A" + Spell(centre) + " " + Spell(radius) + " " + Spell(startAngle) + " " +
+                      Spell(sweepAngle));
   Include(centre.x - radius, centre.y - radius);
   Include(centre.x + radius, centre.y + radius);
 }
 
-void RecordingPath::Close() { segments_.push_back("Z"); }
+void RecordingPath::Close() {
+  segments_.push_back("Z");
+}
 
 std::string RecordingPath::Describe() const {
   std::string text = IsWholeNumbered() ? "W" : "";
@@ -198,7 +202,8 @@ void RecordingPen::SetDashArray(const float* dashes, std::int32_t count) {
 }
 
 void RecordingPen::GetDashArray(float* dashes, std::int32_t count) const {
-  const auto n = std::min<std::size_t>(static_cast<std::size_t>(std::max(0, count)), dashes_.size());
+  const auto n =
+      std::min<std::size_t>(static_cast<std::size_t>(std::max(0, count)), dashes_.size());
   std::copy_n(dashes_.begin(), n, dashes);
 }
 
@@ -306,7 +311,11 @@ boost::intrusive_ptr<PathInterface> RecordingSupplier::NewPath() const {
 
 RecordingSurface::RecordingSurface(const RecordingSupplier* supplier, std::shared_ptr<CallLog> log,
                                    int id, std::int32_t width, std::int32_t height, bool hasImage)
-    : SurfaceInterface(supplier), log_(std::move(log)), id_(id), width_(width), height_(height),
+    : SurfaceInterface(supplier),
+      log_(std::move(log)),
+      id_(id),
+      width_(width),
+      height_(height),
       hasImage_(hasImage) {
   State bottom;
   bottom.clip = {0, 0, width, height};
@@ -360,7 +369,8 @@ void RecordingSurface::Clip(const PathInterface& path, FillType fillType) {
   const RecordingPath& recording = AsRecordingPath(path);
   Log("Clip", recording.Describe());
   State& state = states_.back();
-  state.clip = velkcore::Intersection(state.clip, DeviceBounds(recording.GetBounds(), state.matrix));
+  state.clip =
+      velkcore::Intersection(state.clip, DeviceBounds(recording.GetBounds(), state.matrix));
 }
 
 RectT<std::int32_t> RecordingSurface::GetClipBounds() const {
@@ -399,8 +409,8 @@ void RecordingSurface::DrawImage(const ImageInterface& image, const PointT<float
   const auto* recorded = dynamic_cast<const RecordingImage*>(&image);
   const std::string name = recorded != nullptr ? recorded->GetName() : "image";
   Log("DrawImage", name + " " + std::to_string(image.GetWidth()) + "x" +
-                       std::to_string(image.GetHeight()) + " at " + Spell(topLeft) +
-                       " opacity " + Spell(opacity));
+                       std::to_string(image.GetHeight()) + " at " + Spell(topLeft) + " opacity " +
+                       Spell(opacity));
 }
 
 boost::intrusive_ptr<ImageInterface> RecordingSurface::GetSurfaceImage() {
@@ -424,7 +434,9 @@ void RecordingSurface::SetAntiAliasPolicy(AntiAliasPolicy policy) {
   states_.back().antiAlias = policy;
 }
 
-AntiAliasPolicy RecordingSurface::GetAntiAliasPolicy() const { return states_.back().antiAlias; }
+AntiAliasPolicy RecordingSurface::GetAntiAliasPolicy() const {
+  return states_.back().antiAlias;
+}
 
 void RecordingSurface::SetTextDisplayPolicy(TextDisplayPolicy policy) {
   Log("SetTextDisplayPolicy", std::to_string(static_cast<int>(policy)));
@@ -435,7 +447,9 @@ TextDisplayPolicy RecordingSurface::GetTextDisplayPolicy() const {
   return states_.back().textDisplay;
 }
 
-void RecordingSurface::Flush() { Log("Flush", ""); }
+void RecordingSurface::Flush() {
+  Log("Flush", "");
+}
 
 void RecordingSurface::DrawStringImpl(const BrushInterface& brush, const FontInterface&,
                                       const char16_t* text, const PointT<float>& point,
