@@ -2,11 +2,11 @@
 
 #include <gtest/gtest.h>
 
-#include <fstream>
-#include <iterator>
+#include <filesystem>
 #include <string>
 
 #include <velkcore/Error.h>
+#include <velkcore/File.h>
 #include <velkui/ui/ThemePalette.h>
 
 namespace velkui::ui {
@@ -15,10 +15,8 @@ namespace {
 using KeyValue = KeyframeThemeEditor::KeyValue;
 using ColorTrack = KeyframeThemeEditor::ColorTrack;
 
-std::string ReadThemeFile(const std::string& name) {
-  std::ifstream file(std::string(VELKUI_TEST_DATA_DIR) + "/data/theme/" + name, std::ios::binary);
-  EXPECT_TRUE(file.good()) << name;
-  return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+std::filesystem::path ThemeFile(const char* name) {
+  return std::filesystem::path(VELKUI_TEST_DATA_DIR) / "data" / "theme" / name;
 }
 
 KeyValue Value(float v) {
@@ -50,7 +48,7 @@ class ThemeParserTest : public ::testing::Test {
 };
 
 TEST_F(ThemeParserTest, ThemeFileGivesADarkAndALightEnd) {
-  Parse(ReadThemeFile("brightness-range.xml"));
+  KeyframeThemeParser(editor_).ParseFile(ThemeFile("brightness-range.xml"));
   for (const ThemeColorIndex index : {1, 2, 4, 6, 18}) {
     EXPECT_EQ(editor_.GetColorTrack(index).size(), 2u) << index;
   }
@@ -109,8 +107,8 @@ TEST_F(ThemeParserTest, IncompleteKeyFramesAddNoKeyButStillReplaceTheTrack) {
 
 TEST_F(ThemeParserTest, LoadingAgainReplacesTracksInsteadOfMerging) {
   KeyframeThemeParser parser(editor_);
-  const std::string replacement = ReadThemeFile("replacement.xml");
-  parser.Parse(ReadThemeFile("brightness-range.xml"));
+  const std::string replacement = velkcore::ReadFileContents(ThemeFile("replacement.xml"));
+  parser.ParseFile(ThemeFile("brightness-range.xml"));
   parser.Parse(replacement);
   parser.Parse(
       std::span(reinterpret_cast<const unsigned char*>(replacement.data()), replacement.size()));
@@ -120,7 +118,7 @@ TEST_F(ThemeParserTest, LoadingAgainReplacesTracksInsteadOfMerging) {
 
 TEST_F(ThemeParserTest, BadDocumentsAreErrorsThatLeaveTheEditorAlone) {
   editor_.SetColorKeyValue(1, 0.0f, Value(0.7f));
-  const velkcore::Exception error = ErrorOf(ReadThemeFile("bad-value.xml"));
+  const velkcore::Exception error = ErrorOf(velkcore::ReadFileContents(ThemeFile("bad-value.xml")));
   EXPECT_EQ(error.GetKey(), kThemeFileInvalidValueKey);
   EXPECT_EQ(error.GetReplacements()[0], u"4");  // line
   EXPECT_EQ(error.GetReplacements()[2], u"v");
@@ -143,7 +141,9 @@ TEST_F(ThemeParserTest, BadDocumentsAreErrorsThatLeaveTheEditorAlone) {
   EXPECT_EQ(editor_.GetColorTrack(1), (ColorTrack{{0.0f, Value(0.7f)}}));
   EXPECT_FALSE(editor_.HasColorTrack(2));
   // The parser starts afresh after a failure.
-  Parse(ReadThemeFile("replacement.xml"));
+  KeyframeThemeParser parser(editor_);
+  EXPECT_THROW(parser.ParseFile(ThemeFile("missing.xml")), velkcore::Exception);
+  parser.ParseFile(ThemeFile("replacement.xml"));
   EXPECT_EQ(editor_.GetColorTrack(1), (ColorTrack{{0.5f, Value(0.4f)}}));
 }
 

@@ -4,6 +4,7 @@
 #include <cmath>
 
 #include <velkcore/Error.h>
+#include <velkcore/File.h>
 
 namespace velkui::ui {
 
@@ -52,6 +53,10 @@ void KeyframeThemeParser::Parse(std::string_view xml) {
 void KeyframeThemeParser::Parse(std::span<const unsigned char> xml) {
   Reset();
   AbstractParseHandler::Parse(xml);
+}
+
+void KeyframeThemeParser::ParseFile(const std::filesystem::path& path) {
+  Parse(velkcore::ReadFileContents(path));
 }
 
 void KeyframeThemeParser::Reset() {

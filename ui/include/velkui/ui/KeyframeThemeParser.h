@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <filesystem>
 #include <map>
 #include <optional>
 #include <span>
@@ -54,6 +55,8 @@ class KeyframeThemeParser : public velkcore::AbstractParseHandler {
 
   void Parse(std::string_view xml);
   void Parse(std::span<const unsigned char> xml);
+  // Reads a theme file from disk (the core's file errors pass through).
+  void ParseFile(const std::filesystem::path& path);
 
  protected:
   void StartElement(std::string_view name,

@@ -32,9 +32,10 @@ class Theme {
   static constexpr ThemeFontIndex kDefaultFontCount = 8;
   static constexpr float kDefaultFontSize = 11.0f;
 
-  // Every font index below `fontCount` starts with the default face and size
-  // 11; then the platform's user-interface face is chosen for the usual text
-  // fonts (DoSetFontNames). The colours start as the default palette at the
+  // Every font index below `fontCount` (at most 4096) starts at size 11 with
+  // "Tahoma", or with the platform's user-interface face when the font
+  // configuration lacks Tahoma; then DoSetFontNames gives the platform face to
+  // the usual text fonts. The colours start as the default palette at the
   // default brightness.
   explicit Theme(ThemeFontIndex fontCount = kDefaultFontCount);
   virtual ~Theme();
@@ -61,7 +62,7 @@ class Theme {
   virtual float GetFontSize(ThemeFontIndex index) const;
   bool HasFont(ThemeFontIndex index) const;
 
-  // Rebuilds every colour for brightness `b` (finite) and applies the tint.
+  // Rebuilds every colour for `brightness` (finite) and applies the tint.
   void SetBrightness(float brightness);
   float GetBrightness() const { return DoGetBrightness(); }
   // Greys take on the tint's hue (see DoSetTinting); colours are rebuilt at once.
