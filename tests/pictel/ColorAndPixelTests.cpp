@@ -32,8 +32,8 @@ TEST(HSBtoRGB, PrimaryHuesAndWrapAround) {
 TEST(HSBtoRGB, EverySectorAndGrey) {
   // Half saturation and brightness 0.8 at the middle of each sector.
   const float b = 0.8f;
-  const float p = 0.4f;   // (1 - s) b
-  const float q = 0.6f;   // (1 - s f) b with f = 0.5
+  const float p = 0.4f;  // (1 - s) b
+  const float q = 0.6f;  // (1 - s f) b with f = 0.5
   ExpectColor({b, q, p, 1}, HSBtoRGB<float>(30, 0.5f, b, 1));
   ExpectColor({q, b, p, 1}, HSBtoRGB<float>(90, 0.5f, b, 1));
   ExpectColor({p, b, q, 1}, HSBtoRGB<float>(150, 0.5f, b, 1));

@@ -22,8 +22,8 @@ class TruncationTest : public ::testing::Test {
 
 TEST_F(TruncationTest, TextThatFitsExactlyIsKeptOneUnitWiderIsCut) {
   const char16_t* text = u"abcdefghij";  // 50 wide
-  for (auto mode : {TextTruncation::kEnd, TextTruncation::kEndEllipsis,
-                    TextTruncation::kPathEllipsis}) {
+  for (auto mode :
+       {TextTruncation::kEnd, TextTruncation::kEndEllipsis, TextTruncation::kPathEllipsis}) {
     EXPECT_EQ(u"abcdefghij", TruncateString(font, text, mode, 50.0f));
     EXPECT_NE(u"abcdefghij", TruncateString(font, text, mode, 49.0f));
   }
@@ -48,8 +48,8 @@ TEST_F(TruncationTest, EndEllipsisNeverShowsTheEllipsisAlone) {
 
 TEST_F(TruncationTest, PathEllipsisKeepsHeadAndTail) {
   const UTF16String text = u"ABCDEFGHIJKLMNOPQRST";  // 20 units, 100 wide
-  EXPECT_EQ(u"ABCDEFG...ST", TruncateString(font, text.c_str(), TextTruncation::kPathEllipsis,
-                                            61.0f));
+  EXPECT_EQ(u"ABCDEFG...ST",
+            TruncateString(font, text.c_str(), TextTruncation::kPathEllipsis, 61.0f));
   EXPECT_EQ(u"...RST", TruncateString(font, text.c_str(), TextTruncation::kPathEllipsis, 31.0f));
   EXPECT_EQ(u"", TruncateString(font, text.c_str(), TextTruncation::kPathEllipsis, 0.0f));
 }
@@ -90,8 +90,7 @@ TEST_F(TruncationTest, CutAtEndNeverSplitsASurrogatePair) {
   // Units: a b D83D DE00 c d; at maxWidth 16 a unit-wise cut would end inside the pair.
   EXPECT_EQ(u"ab", TruncateString(font, u"ab\U0001F600cd", TextTruncation::kEnd, 16.0f));
   EXPECT_EQ(u"ab\U0001F600", TruncateString(font, u"ab\U0001F600cd", TextTruncation::kEnd, 21.0f));
-  EXPECT_EQ(u"ab...",
-            TruncateString(font, u"ab\U0001F600cd", TextTruncation::kEndEllipsis, 29.0f));
+  EXPECT_EQ(u"ab...", TruncateString(font, u"ab\U0001F600cd", TextTruncation::kEndEllipsis, 29.0f));
 }
 
 class DrawStringTest : public ::testing::Test {
@@ -122,8 +121,8 @@ TEST_F(DrawStringTest, NothingIsDrawnWhenNotEvenTheEllipsisFits) {
                       0.0f);
   EXPECT_TRUE(Drawn().empty());
   // Without truncation maxWidth does not matter.
-  surface->DrawString(*brush, *font, u"abc", {0, 50}, TextAlignment::kStart,
-                      TextTruncation::kNone, 0.0f);
+  surface->DrawString(*brush, *font, u"abc", {0, 50}, TextAlignment::kStart, TextTruncation::kNone,
+                      0.0f);
   EXPECT_EQ(1u, Drawn().size());
 }
 

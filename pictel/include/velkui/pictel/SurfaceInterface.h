@@ -7,6 +7,8 @@
 #include <velkcore/Geometry.h>
 #include <velkcore/RefCountedObject.h>
 #include <velkcore/Strings.h>
+#include <velkui/pictel/CacheInterface.h>
+#include <velkui/pictel/ImageInterface.h>
 #include <velkui/pictel/PictelTypes.h>
 
 namespace velkui::pictel {
