@@ -95,6 +95,7 @@ void AbstractParseHandler::Parse(std::string_view xml) {
   } active{*this};
   parser_ = parser.get();
   pendingError_ = nullptr;
+  StartDocument();
 
   XML_Status status = XML_STATUS_OK;
   std::size_t offset = 0;
@@ -120,6 +121,8 @@ void AbstractParseHandler::Parse(std::span<const unsigned char> xml) {
 
 void AbstractParseHandler::CharacterData(std::string_view) {}
 
+void AbstractParseHandler::StartDocument() {}
+
 void AbstractParseHandler::EndDocument() {}
 
 XMLPosition AbstractParseHandler::CurrentPosition() const {
@@ -130,8 +133,14 @@ XMLPosition AbstractParseHandler::CurrentPosition() const {
 void AbstractParseHandler::RaiseAt(const XMLPosition& where, std::string_view key,
                                    std::int32_t number, const ReplacementValue& r2,
                                    const ReplacementValue& r3) {
-  ThrowError(ErrorLevel::kError, key, kCategoryUtilities, number, 0,
-             static_cast<double>(where.line), static_cast<double>(where.column), r2, r3);
+  RaiseAt(where, key, kCategoryUtilities, number, r2, r3);
+}
+
+void AbstractParseHandler::RaiseAt(const XMLPosition& where, std::string_view key,
+                                   std::int32_t category, std::int32_t number,
+                                   const ReplacementValue& r2, const ReplacementValue& r3) {
+  ThrowError(ErrorLevel::kError, key, category, number, 0, static_cast<double>(where.line),
+             static_cast<double>(where.column), r2, r3);
 }
 
 std::optional<std::string_view> AbstractParseHandler::FindAttribute(

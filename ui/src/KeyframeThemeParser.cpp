@@ -45,21 +45,11 @@ std::optional<ThemeColorIndex> ParseIndex(std::string_view text) {
 
 }  // namespace
 
-void KeyframeThemeParser::Parse(std::string_view xml) {
-  Reset();
-  AbstractParseHandler::Parse(xml);
-}
-
-void KeyframeThemeParser::Parse(std::span<const unsigned char> xml) {
-  Reset();
-  AbstractParseHandler::Parse(xml);
-}
-
 void KeyframeThemeParser::ParseFile(const std::filesystem::path& path) {
   Parse(velkcore::ReadFileContents(path));
 }
 
-void KeyframeThemeParser::Reset() {
+void KeyframeThemeParser::StartDocument() {
   tracks_.clear();
   themeKey_.reset();
   depth_ = 0;
@@ -91,7 +81,7 @@ void KeyframeThemeParser::EndDocument() {
       editor_.SetColorTrack(index, track);
     }
   }
-  Reset();
+  tracks_.clear();
 }
 
 void KeyframeThemeParser::ReadRoot(std::string_view name) {
@@ -154,10 +144,7 @@ ThemeColorIndex KeyframeThemeParser::ReadIndex(std::string_view attribute,
 void KeyframeThemeParser::Raise(std::string_view key, std::int32_t number,
                                 const velkcore::ReplacementValue& r2,
                                 const velkcore::ReplacementValue& r3) const {
-  const velkcore::XMLPosition where = CurrentPosition();
-  velkcore::ThrowError(velkcore::ErrorLevel::kError, key, velkcore::kCategoryUserInterface, number,
-                       0, static_cast<double>(where.line), static_cast<double>(where.column), r2,
-                       r3);
+  RaiseAt(CurrentPosition(), key, velkcore::kCategoryUserInterface, number, r2, r3);
 }
 
 }  // namespace velkui::ui

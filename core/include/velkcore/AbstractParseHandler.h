@@ -57,6 +57,8 @@ class AbstractParseHandler {
   virtual void EndElement(std::string_view name) = 0;
   // Text may arrive in several pieces for one run of text.
   virtual void CharacterData(std::string_view text);
+  // Called once before the first event of every Parse, so a handler can reset itself.
+  virtual void StartDocument();
   // Called once after the whole document was read without fault.
   virtual void EndDocument();
 
@@ -68,6 +70,9 @@ class AbstractParseHandler {
   [[noreturn]] static void RaiseAt(const XMLPosition& where, std::string_view key,
                                    std::int32_t number, const ReplacementValue& r2 = {},
                                    const ReplacementValue& r3 = {});
+  [[noreturn]] static void RaiseAt(const XMLPosition& where, std::string_view key,
+                                   std::int32_t category, std::int32_t number,
+                                   const ReplacementValue& r2, const ReplacementValue& r3);
 
   // The value of the named attribute, if the element has it.
   static std::optional<std::string_view> FindAttribute(std::span<const XMLAttribute> attributes,

@@ -53,8 +53,7 @@ class KeyframeThemeParser : public velkcore::AbstractParseHandler {
  public:
   explicit KeyframeThemeParser(KeyframeThemeEditor& editor) : editor_(editor) {}
 
-  void Parse(std::string_view xml);
-  void Parse(std::span<const unsigned char> xml);
+  using AbstractParseHandler::Parse;
   // Reads a theme file from disk (the core's file errors pass through).
   void ParseFile(const std::filesystem::path& path);
 
@@ -62,10 +61,10 @@ class KeyframeThemeParser : public velkcore::AbstractParseHandler {
   void StartElement(std::string_view name,
                     std::span<const velkcore::XMLAttribute> attributes) override;
   void EndElement(std::string_view name) override;
+  void StartDocument() override;
   void EndDocument() override;
 
  private:
-  void Reset();
   void ReadRoot(std::string_view name);
   void ReadTheme(std::span<const velkcore::XMLAttribute> attributes);
   void ReadKeyFrame(std::span<const velkcore::XMLAttribute> attributes);
