@@ -1,0 +1,166 @@
+#pragma once
+
+// Helpers shared by the node and routing tests: a manager installed for one
+// test and a sub-view that logs its hooks.
+
+#include <cmath>
+#include <functional>
+#include <memory>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include <velkcore/Geometry.h>
+#include <velkui/pictel/Pictel.h>
+#include <velkui/pictel/SurfaceInterface.h>
+#include <velkui/ui/KeyboardEvent.h>
+#include <velkui/ui/MouseEvent.h>
+#include <velkui/ui/UI_NodeManager.h>
+#include <velkui/ui/UI_SubView.h>
+
+namespace velkui::ui::test {
+
+using velkcore::PointT;
+using velkcore::RectT;
+using velkcore::ScaleMatrixT;
+
+using EventLog = std::vector<std::string>;
+
+// Installs a fresh manager for the lifetime of the object.
+template <typename Manager = UI_NodeManager>
+class ScopedManager {
+ public:
+  ScopedManager() { UI_NodeManager::Set(&manager_); }
+  ~ScopedManager() { UI_NodeManager::Set(nullptr); }
+  Manager& operator*() { return manager_; }
+  Manager* operator->() { return &manager_; }
+
+ private:
+  Manager manager_;
+};
+
+// A sub-view that appends what happens to it to a shared log ("name:what").
+class LoggingView : public UI_SubView {
+ public:
+  LoggingView(std::string name, std::shared_ptr<EventLog> log)
+      : name_(std::move(name)), log_(std::move(log)) {
+    UI_SetNodeID(name_);
+  }
+
+  const std::string& Name() const { return name_; }
+
+  // Behaviour switches.
+  bool handlesMouse = false;
+  bool handlesPreMouse = false;
+  bool handlesKeyboard = false;
+  bool handlesPreKeyboard = false;
+  bool wantsFocus = false;
+  bool passesCharsToParent = false;
+  bool invalidatesOnMouseOver = false;
+  bool paints = false;
+  std::function<void(LoggingView&)> onMouse;
+  std::function<void(LoggingView&)> onKeyboard;
+  std::function<void(LoggingView&)> onFocusChanged;
+  std::function<void(LoggingView&)> onMouseOverChanged;
+  std::function<void(LoggingView&, NodeChange)> onNodeChanged;
+  std::function<void(LoggingView&)> onDraw;
+
+  // Mouse positions received, in this node's coordinates.
+  std::vector<PointT<float>> mousePositions;
+  int invalidations = 0;
+  int sizeChanges = 0;
+  int disabledChanges = 0;
+  int drawCount = 0;
+
+  bool UI_DoMouseEvent(UI_Node* target, const MouseEvent& event) override {
+    Log("mouse(" + NameOf(target) + "," + std::to_string(event.GetAction()) + ")");
+    mousePositions.push_back(event.GetPosition());
+    if (onMouse) onMouse(*this);
+    return handlesMouse;
+  }
+  bool UI_DoPreMouseEvent(UI_Node* target, const MouseEvent&) override {
+    Log("premouse(" + NameOf(target) + ")");
+    return handlesPreMouse;
+  }
+  bool UI_DoKeyboardEvent(UI_Node* target, const KeyboardEvent&) override {
+    Log("key(" + NameOf(target) + ")");
+    if (onKeyboard) onKeyboard(*this);
+    return handlesKeyboard;
+  }
+  bool UI_DoPreKeyboardEvent(UI_Node* target, const KeyboardEvent&) override {
+    Log("prekey(" + NameOf(target) + ")");
+    return handlesPreKeyboard;
+  }
+  bool UI_DoCursor(UI_Node* target, const PointT<float>&, ModifierKeys modifiers) override {
+    Log("cursor(" + NameOf(target) + "," + std::to_string(modifiers.Get()) + ")");
+    return false;
+  }
+  bool UI_WantsKeyboardFocus() const override { return wantsFocus; }
+  bool UI_DispatchKeyboardCharEventToParent() override { return passesCharsToParent; }
+  bool UI_InvalidateOnMouseOverChange(bool) const override { return invalidatesOnMouseOver; }
+  void UI_FocusChanged() override {
+    Log("focus");
+    if (onFocusChanged) onFocusChanged(*this);
+  }
+  void UI_MouseOverChanged() override {
+    Log("over");
+    if (onMouseOverChanged) onMouseOverChanged(*this);
+  }
+  void UI_NodeChanged(NodeChange change) override {
+    Log("change" + std::to_string(static_cast<int>(change)));
+    if (onNodeChanged) onNodeChanged(*this, change);
+  }
+  void UI_SizeChanged(const RectT<float>&) override { ++sizeChanges; }
+  void UI_DisabledStateChanged() override { ++disabledChanges; }
+  void UI_Invalidate(const RectT<std::int32_t>* rect, InvalidateFlags flags) override {
+    ++invalidations;
+    if (rect != nullptr) lastInvalidRect = *rect;
+    UI_SubView::UI_Invalidate(rect, flags);
+  }
+  void UI_Draw(pictel::Pictel* context) const override {
+    Log("draw");
+    ++const_cast<LoggingView*>(this)->drawCount;
+    if (onDraw) onDraw(const_cast<LoggingView&>(*this));
+    if (paints) context->GetSurface()->PaintRect({0, 0, 0, 1}, UI_GetLocalRectF(false));
+    UI_SubView::UI_Draw(context);
+  }
+
+  RectT<std::int32_t> lastInvalidRect{};
+
+  void Log(const std::string& what) const {
+    if (log_) log_->push_back(name_ + ":" + what);
+  }
+  static std::string NameOf(const UI_Node* node) {
+    if (node == nullptr) return "null";
+    return node->UI_GetNodeID();
+  }
+
+ private:
+  std::string name_;
+  std::shared_ptr<EventLog> log_;
+};
+
+using LoggingViewP = boost::intrusive_ptr<LoggingView>;
+
+// A shown sub-view with a frame, added to `parent` when given.
+template <typename View = LoggingView, typename... Args>
+boost::intrusive_ptr<View> MakeView(UI_Node* parent, const RectT<float>& frame, Args&&... args) {
+  auto view = velkcore::MakeIntrusive<View>(std::forward<Args>(args)...);
+  view->UI_SetLocalRectF(frame);
+  view->UI_Show(true);
+  if (parent != nullptr) parent->ChildPushBack(view);
+  return view;
+}
+
+inline MouseEvent Mouse(MouseEvent::Action action, float x, float y, std::int32_t button = 1,
+                        std::int32_t count = 1, ModifierKeys modifiers = {}) {
+  return MouseEvent(action, button, count, PointT<float>{x, y}, modifiers);
+}
+
+inline KeyboardEvent Key(KeyboardEvent::Action action, std::int16_t osCode,
+                         ModifierKeys modifiers = {}, std::vector<char16_t> chars = {},
+                         bool repeat = false) {
+  return KeyboardEvent(action, std::move(chars), osCode, modifiers, repeat);
+}
+
+}  // namespace velkui::ui::test
