@@ -6,6 +6,7 @@
 #include <cmath>
 #include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 #include <utility>
 #include <vector>
@@ -13,6 +14,7 @@
 #include <velkcore/Geometry.h>
 #include <velkui/pictel/Pictel.h>
 #include <velkui/pictel/SurfaceInterface.h>
+#include <velkui/ui/InputCapture.h>
 #include <velkui/ui/KeyboardEvent.h>
 #include <velkui/ui/MouseEvent.h>
 #include <velkui/ui/UI_NodeManager.h>
@@ -58,6 +60,7 @@ class LoggingView : public UI_SubView {
   bool passesCharsToParent = false;
   bool invalidatesOnMouseOver = false;
   bool paints = false;
+  bool ownsPlatformWindow = false;
   std::function<void(LoggingView&)> onMouse;
   std::function<void(LoggingView&)> onKeyboard;
   std::function<void(LoggingView&)> onFocusChanged;
@@ -110,6 +113,25 @@ class LoggingView : public UI_SubView {
     Log("change" + std::to_string(static_cast<int>(change)));
     if (onNodeChanged) onNodeChanged(*this, change);
   }
+  void UI_SetCapture() override {
+    Log("setcapture");
+    UI_SubView::UI_SetCapture();
+  }
+  void UI_ReleaseCapture() override {
+    Log("releasecapture");
+    UI_SubView::UI_ReleaseCapture();
+  }
+  bool UI_ReceivesEventsFromOS() const override { return ownsPlatformWindow; }
+  bool UI_AreAllParentsVisible() const override {
+    // A root stands for a window here.
+    return UI_GetParentNode() == nullptr ? UI_IsShown() : UI_SubView::UI_AreAllParentsVisible();
+  }
+  // Lets a test ask for the pre-offer of mouse events (state flag 0x10).
+  void SetWantsPreMouseEvents(bool wants) {
+    StateFlags flags = UI_GetStateFlags();
+    flags.Set(kStateWantsPreMouseEvents, wants);
+    UI_SetStateFlags(flags);
+  }
   void UI_SizeChanged(const RectT<float>&) override { ++sizeChanges; }
   void UI_DisabledStateChanged() override { ++disabledChanges; }
   void UI_Invalidate(const RectT<std::int32_t>* rect, InvalidateFlags flags) override {
@@ -141,6 +163,67 @@ class LoggingView : public UI_SubView {
 };
 
 using LoggingViewP = boost::intrusive_ptr<LoggingView>;
+
+// A manager whose platform hooks are observed (and the pointer position set) by the test.
+class FakeManager : public UI_NodeManager {
+ public:
+  std::vector<UI_Node*> toolTipLeaves;
+  std::vector<bool> toolTipSuspensions;
+  std::vector<std::string> toolTipDisposals;
+  int pendingKeyboardRemovals = 0;
+  std::optional<PointT<float>> pointer;
+
+  void MouseOverLeafChangedForToolTips(UI_Node* leaf) override { toolTipLeaves.push_back(leaf); }
+  void SuspendToolTips(bool suspend) override { toolTipSuspensions.push_back(suspend); }
+  // Called from a node's destructor: only its non-virtual parts may be read.
+  void DisposeToolTipOwnedBy(UI_Node& node) override {
+    toolTipDisposals.push_back(node.UI_GetNodeID());
+  }
+  void RemovePendingKeyboardMessages() override { ++pendingKeyboardRemovals; }
+  std::optional<PointT<float>> QueryPointerPosition(const UI_Node& root) const override {
+    return pointer ? pointer : UI_NodeManager::QueryPointerPosition(root);
+  }
+};
+
+// An input capture that logs what it gets ("capture:...").
+class LoggingCapture : public InputCapture {
+ public:
+  LoggingCapture(UI_Node* node, const MouseEvent& initial, std::shared_ptr<EventLog> log)
+      : InputCapture(node, initial), log_(std::move(log)) {}
+
+  bool handlesMouse = false;
+  bool handlesKeyboard = false;
+  std::function<void()> onMouse;
+  std::function<void()> onBegin;
+  std::vector<PointT<float>> mousePositions;
+
+  void Begin() override {
+    log_->push_back("capture:begin");
+    if (onBegin) onBegin();
+  }
+  void End() override { log_->push_back("capture:end"); }
+  bool DoMouseEvent(const MouseEvent& event) override {
+    log_->push_back("capture:mouse" + std::to_string(event.GetAction()));
+    mousePositions.push_back(event.GetPosition());
+    if (onMouse) onMouse();
+    return handlesMouse;
+  }
+  bool DoKeyboardEvent(const KeyboardEvent&) override {
+    log_->push_back("capture:key");
+    return handlesKeyboard;
+  }
+  bool DoCursor(const PointT<float>& point, ModifierKeys modifiers) override {
+    lastCursor = point;
+    lastCursorModifiers = modifiers;
+    return true;
+  }
+
+  PointT<float> lastCursor{};
+  ModifierKeys lastCursorModifiers;
+
+ private:
+  std::shared_ptr<EventLog> log_;
+};
 
 // A shown sub-view with a frame, added to `parent` when given.
 template <typename View = LoggingView, typename... Args>
