@@ -16,6 +16,11 @@ using velkcore::RectT;
 
 namespace {
 
+std::type_index SupplierType(const SurfaceInterface& surface) {
+  const SupplierInterface& supplier = *surface.GetSupplier();
+  return std::type_index(typeid(supplier));
+}
+
 // Larger bitmaps than this are not worth caching (and exceed what the
 // backend's image surfaces hold): such a node simply draws directly.
 constexpr double kMaximumCacheSide = 16384.0;
@@ -55,7 +60,7 @@ RectT<std::int32_t> DevicePixelBounds(const RectT<float>& rect, const MatrixT<fl
 
 BitmapCacheInterface::BitmapCacheInterface(SurfaceInterface& surface, const RectT<float>& rect)
     : rect_(rect),
-      supplierType_(typeid(*surface.GetSupplier())),
+      supplierType_(SupplierType(surface)),
       antiAlias_(surface.GetAntiAliasPolicy()),
       interpolation_(surface.GetInterpolationPolicy()) {
   surface.GetTransform(&transform_);
@@ -75,7 +80,7 @@ BitmapCacheInterface::~BitmapCacheInterface() = default;
 
 bool BitmapCacheInterface::IsValid(const SurfaceInterface& surface,
                                    const RectT<float>& rect) const {
-  if (std::type_index(typeid(*surface.GetSupplier())) != supplierType_) return false;
+  if (SupplierType(surface) != supplierType_) return false;
   if (!(rect == rect_)) return false;
   MatrixT<float> current;
   surface.GetTransform(&current);
