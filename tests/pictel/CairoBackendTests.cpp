@@ -11,6 +11,7 @@
 #include <velkui/pictel/PathShapes.h>
 #include <velkui/pictel/PictelErrors.h>
 #include <velkui/pictel/PictelHandles.h>
+#include <velkui/pictel/ScAcquireSurfaceHDC.h>
 #include <velkui/pictel/StartupShutdownGdiPlus.h>
 #include <velkui/test/PixelProbe.h>
 #include <velkui/test/RecordingSupplier.h>
@@ -372,6 +373,21 @@ TEST_F(CairoTest, ImpossibleSurfacesAreErrors) {
 TEST_F(CairoTest, OpaqueSurfacesStartWhite) {
   SurfaceP opaque(*supplier, 4, 4, false);
   EXPECT_EQ((Pixel{255, 255, 255, 255}), PixelProbe(*opaque).At(3, 3));
+}
+
+}  // namespace
+
+namespace {
+
+TEST_F(CairoTest, DeviceContextIsLentOnlyByPlatformSurfaces) {
+  {
+    ScAcquireSurfaceHDC lent(surface.Get());
+    EXPECT_NE(nullptr, lent.Get());
+  }
+  boost::intrusive_ptr<velkui::test::RecordingSupplier> recording(
+      new velkui::test::RecordingSupplier());
+  SurfaceP foreign(*recording, 10, 10);
+  EXPECT_EQ(30, ErrorNumber([&] { ScAcquireSurfaceHDC lent(foreign.Get()); }));
 }
 
 }  // namespace

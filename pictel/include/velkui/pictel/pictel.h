@@ -24,6 +24,7 @@
 #include <velkui/pictel/PictelTypes.h>
 #include <velkui/pictel/PixelSwizzle.h>
 #include <velkui/pictel/RedrawDebug.h>
+#include <velkui/pictel/ScAcquireSurfaceHDC.h>
 #include <velkui/pictel/StartupShutdownGdiPlus.h>
 #include <velkui/pictel/StringTruncation.h>
 #include <velkui/pictel/SupplierInterface.h>

@@ -68,8 +68,9 @@ class OSSurfaceInterface : public SurfaceInterface {
   TextDisplayPolicy GetTextDisplayPolicy() const override { return Top().textDisplay; }
   void Flush() override;
 
-  // The Cairo context drawing goes through.
+  // The Cairo context drawing goes through, and the surface it draws into.
   cairo_t* GetOutputGraphics() const { return context_.get(); }
+  cairo_surface_t* GetTargetSurface() const { return surface_.get(); }
   // Another surface that mirrors this one's policies, and the offset of this
   // surface's origin within it (drawing is translated by minus the offset).
   void SetReferenceSurface(OSSurfaceInterface* reference,

@@ -46,16 +46,16 @@ TextEngine& TextEngine::Get() {
 }
 
 TextEngine::TextEngine() {
-  if (FcInit() == FcFalse) ThrowPictelError(kErrorStartupKey, kErrorStartup, 0);
+  if (FcInit() == FcFalse) ThrowPictelError(kErrorStartupKey, kErrorStartup);
   fontMap_.reset(pango_cairo_font_map_new());
-  if (!fontMap_) ThrowPictelError(kErrorStartupKey, kErrorStartup, 0);
+  if (!fontMap_) ThrowPictelError(kErrorStartupKey, kErrorStartup);
   smoothContext_ = NewContext(CAIRO_ANTIALIAS_GRAY);
   monoContext_ = NewContext(CAIRO_ANTIALIAS_NONE);
 }
 
 PangoContextPtr TextEngine::NewContext(cairo_antialias_t antialias) const {
   PangoContextPtr context(pango_font_map_create_context(fontMap_.get()));
-  if (!context) ThrowPictelError(kErrorStartupKey, kErrorStartup, 0);
+  if (!context) ThrowPictelError(kErrorStartupKey, kErrorStartup);
   cairo_font_options_t* options = cairo_font_options_create();
   cairo_font_options_set_antialias(options, antialias);
   cairo_font_options_set_hint_style(options, CAIRO_HINT_STYLE_NONE);
