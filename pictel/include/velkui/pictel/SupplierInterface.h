@@ -40,7 +40,8 @@ class SupplierInterface : public virtual velkcore::RefCountedObject {
   // else opaque white.
   virtual boost::intrusive_ptr<SurfaceInterface> NewSurface(std::int32_t width, std::int32_t height,
                                                             bool transparent) const = 0;
-  // A surface over caller memory; `deleter` runs when the last user of the pixels dies.
+  // A surface over caller memory; `deleter` runs when the last user of the pixels
+  // dies (not when the factory fails: the caller still owns the memory then).
   virtual boost::intrusive_ptr<SurfaceInterface> NewBufferSurface(std::int32_t width,
                                                                   std::int32_t height,
                                                                   std::int32_t rowBytes,

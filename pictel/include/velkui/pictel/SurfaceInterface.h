@@ -110,7 +110,8 @@ class SurfaceInterface : public virtual velkcore::RefCountedObject {
                          float opacity) = 0;
   // Blits a cache made by PushCacheStack (error 30 for any other kind of cache).
   virtual void DrawCache(const CacheInterface& cache);
-  // The surface's pixels as an image (shares them, it is not a copy).
+  // The surface's pixels as an image (shares them, it is not a copy). A surface
+  // without pixels of its own returns null, or raises error 35 on the platform backend.
   virtual boost::intrusive_ptr<ImageInterface> GetSurfaceImage() = 0;
 
   // Setters raise 23/24 for out-of-range values and then change nothing.
