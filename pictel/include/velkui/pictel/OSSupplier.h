@@ -13,8 +13,9 @@ namespace velkui::pictel {
 // whatever the text-display policy (only anti-aliasing off makes them one bit
 // per pixel), so that text looks and measures the same on every machine.
 // Buffers and images take the layouts 1, 3, 6 and 7; 3 and 7 are used in place
-// (when rows are a multiple of 4 bytes), the others through a shadow copy (written back to a buffer surface on Flush and
-// when the surface dies; read once when a buffer image is made).
+// (when rows are a multiple of 4 bytes), the others through a shadow copy,
+// written back to a buffer surface's memory on Flush and when the surface dies,
+// read once when a buffer image is made.
 boost::intrusive_ptr<SupplierInterface> NewOSSupplier();
 
 // Whether `supplier` is the platform supplier.
