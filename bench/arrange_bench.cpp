@@ -30,8 +30,12 @@ class Leaf : public Single {
   RectF placed_{};
 };
 
-float LeafWidth(std::size_t i) { return 20.0f + static_cast<float>(i % 7); }
-float LeafHeight(std::size_t i) { return 10.0f + static_cast<float>(i % 5); }
+float LeafWidth(std::size_t i) {
+  return 20.0f + static_cast<float>(i % 7);
+}
+float LeafHeight(std::size_t i) {
+  return 10.0f + static_cast<float>(i % 5);
+}
 
 // Groups of ten children, rows and columns alternating by level, built bottom-up.
 struct Tree {
@@ -112,21 +116,36 @@ void TreeLeafChanged(benchmark::State& state) {
 }
 BENCHMARK(TreeLeafChanged)->Arg(1000)->Arg(10000)->Arg(100000)->Unit(benchmark::kMicrosecond);
 
-// A chain of nested groups, each holding one leaf and the next group.
+class GrowingLeaf : public Leaf {
+ public:
+  using Leaf::Leaf;
+  bool HorizontallyExpandable() const override { return true; }
+};
+
+// A chain of nested groups, each holding one leaf and the next group. With a second argument of
+// 1 the next group comes first and only the deepest leaf can grow, which makes every expansion
+// query descend to the bottom of the chain.
 void DeepChain(benchmark::State& state) {
   const auto depth = static_cast<std::size_t>(state.range(0));
+  const bool growingBottom = state.range(1) != 0;
   for (auto _ : state) {
     std::vector<std::unique_ptr<Leaf>> leaves;
     std::vector<std::unique_ptr<impl::AbstractArrangeableGroup>> groups(depth);
     for (std::size_t level = depth; level-- > 0;) {
-      leaves.push_back(std::make_unique<Leaf>(LeafWidth(level), LeafHeight(level)));
+      if (growingBottom && level + 1 == depth) {
+        leaves.push_back(std::make_unique<GrowingLeaf>(LeafWidth(level), LeafHeight(level)));
+      } else {
+        leaves.push_back(std::make_unique<Leaf>(LeafWidth(level), LeafHeight(level)));
+      }
       if (level % 2 == 0) {
         groups[level] = std::make_unique<Row>();
       } else {
         groups[level] = std::make_unique<Column>();
       }
       std::vector<IArrangeable*> children{leaves.back().get()};
-      if (level + 1 < depth) children.push_back(groups[level + 1].get());
+      if (level + 1 < depth) {
+        children.insert(growingBottom ? children.begin() : children.end(), groups[level + 1].get());
+      }
       groups[level]->SetChildren(children);
     }
     groups.front()->Arrange({0, 0, kWidth * 10, kHeight * 10});
@@ -134,7 +153,7 @@ void DeepChain(benchmark::State& state) {
   }
   state.SetItemsProcessed(static_cast<std::int64_t>(state.iterations() * depth * 2));
 }
-BENCHMARK(DeepChain)->Arg(250)->Arg(500)->Arg(1000)->Arg(2000)->Unit(benchmark::kMicrosecond);
+BENCHMARK(DeepChain)->ArgsProduct({{250, 500, 1000, 2000}, {0, 1}})->Unit(benchmark::kMicrosecond);
 
 void Wrapping(benchmark::State& state) {
   const auto leafCount = static_cast<std::size_t>(state.range(0));

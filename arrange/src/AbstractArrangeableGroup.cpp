@@ -17,7 +17,10 @@ AbstractArrangeableGroup::~AbstractArrangeableGroup() {
 
 void AbstractArrangeableGroup::DetachCandidates() {
   for (const IArrangementP& a : arrangements_) {
-    if (auto* group = dynamic_cast<GroupArrangement*>(a.get())) group->DetachGroup();
+    if (auto* group = dynamic_cast<GroupArrangement*>(a.get())) {
+      group->DetachGroup();
+      group->DetachSeparators();
+    }
   }
 }
 
@@ -27,6 +30,9 @@ void AbstractArrangeableGroup::ReleaseCandidates() {
 }
 
 void AbstractArrangeableGroup::ClearSeparators() {
+  for (const IArrangementP& a : arrangements_) {
+    if (auto* group = dynamic_cast<GroupArrangement*>(a.get())) group->DetachSeparators();
+  }
   separators_.clear();
   if (IsRebuilding()) return;
   // The candidates point at the separators: they go with them.
@@ -75,9 +81,11 @@ void AbstractArrangeableGroup::ChildDestroyed(IArrangeable& child) {
 }
 
 void AbstractArrangeableGroup::RebuildSelf() {
-  ReleaseCandidates();
   for (IArrangeable* child : children_) child->SetParent(this);
+  // Separators first: the old candidates, which may still be in use by an arrangement under
+  // way, let go of the old separators before the host destroys them.
   if (!children_.empty() && separators_.size() != children_.size() - 1) BuildSeparators();
+  ReleaseCandidates();
 
   CombinationEnumerator enumerator(*this);
   enumerator.Run(

@@ -69,10 +69,24 @@ GroupArrangement::GroupArrangement(LineAxis axis, AbstractArrangeableGroup* grou
       [this](std::size_t i) { return MinCrossOf(*children_[i]); }, parameters_);
   minMain_ = minimum.x;
   minCross_ = minimum.y;
+  bool regular = parameters_.spacing >= 0;
   for (const IArrangementP& child : children_) {
+    regular = regular && child->ExpandsRegularly();
     mainExpandable_ = mainExpandable_ || ExpandableMainOf(*child);
     crossExpandable_ = crossExpandable_ ||
                        (IsRow() ? child->VerticallyExpandable() : child->HorizontallyExpandable());
+  }
+  SetExpandsRegularly(regular);
+}
+
+void GroupArrangement::DetachSeparators() {
+  std::fill(separators_.begin(), separators_.end(), nullptr);
+  hiddenSeparators_.clear();
+  for (const IArrangementP& child : children_) {
+    // Lines of a wrapping candidate hold this group's separators; outer children belong to
+    // other groups.
+    auto* line = dynamic_cast<GroupArrangement*>(child.get());
+    if (line != nullptr && !line->outer_) line->DetachSeparators();
   }
 }
 
@@ -148,7 +162,7 @@ float GroupArrangement::ExpandedHeight(float available) const {
 float GroupArrangement::ExpandedMain(float available) const {
   // Nothing inside can grow: offered its minimum or more, the line takes exactly its minimum
   // (it follows from the walk below), without descending into the children.
-  if (!mainExpandable_ && parameters_.spacing >= 0 && available >= minMain_) return minMain_;
+  if (!mainExpandable_ && ExpandsRegularly() && available >= minMain_) return minMain_;
   const double inner = static_cast<double>(available) - parameters_.MainMargins();
   double sum = 0;
   for (const IArrangementP& child : children_) {
@@ -161,7 +175,7 @@ float GroupArrangement::ExpandedMain(float available) const {
 }
 
 float GroupArrangement::ExpandedCross(float available) const {
-  if (!crossExpandable_ && available >= minCross_) return minCross_;
+  if (!crossExpandable_ && ExpandsRegularly() && available >= minCross_) return minCross_;
   const float inner = available - parameters_.CrossMargins();
   float largest = 0;
   bool first = true;

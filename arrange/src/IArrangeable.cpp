@@ -121,8 +121,9 @@ PointF IArrangeable::ArrangeAsRoot(const RectF& rect) {
   BusyScope busy(busy_);
   for (int pass = 0; pass < kMaxArrangePasses; ++pass) {
     passRequested_ = false;
-    impl::IArrangement* chosen = Arrangements().ChooseFor({lastRect_.width, lastRect_.height});
-    if (chosen == nullptr) break;
+    // Held for the pass: the host may drop the tree's candidates while it is being placed.
+    const impl::IArrangementP chosen(Arrangements().ChooseFor({lastRect_.width, lastRect_.height}));
+    if (!chosen) break;
     lastResult_ = chosen->Arrange(lastRect_);
     if (!passRequested_ || !enabled_) break;
   }

@@ -262,3 +262,26 @@ TEST(DynamicGroupTest, ChangingTheTypeRebuildsTheCandidates) {
 
 }  // namespace
 }  // namespace velkui::arrange::test
+
+namespace velkui::arrange::test {
+namespace {
+
+// What a host may do from inside Place: drop the candidates being placed, or the separators.
+TEST(TreeLifetimeTest, HostMayChangeTheGroupWhileItIsBeingPlaced) {
+  Box a(10, 10);
+  Box b(10, 10);
+  TestGroup group(GroupArrangementType::Row, true);
+  group.Hold({&a, &b});
+  int calls = 0;
+  a.onPlace = [&](Box&, const RectF&) {
+    if (++calls == 1) group.SetArrangementType(GroupArrangementType::Column, nullptr);
+    if (calls == 2) group.BuildSeparators();
+  };
+  group.Arrange({0, 0, 100, 100});
+  EXPECT_EQ(b.Last(), (RectF{0, 10, 10, 10}));
+  ASSERT_EQ(group.built.size(), 1u);
+  EXPECT_EQ(group.built[0]->frame, (RectF{0, 10, 10, 0}));
+}
+
+}  // namespace
+}  // namespace velkui::arrange::test

@@ -126,3 +126,30 @@ TEST(BoundedEnumerationTest, SmallProductsAreEnumeratedCompletely) {
 
 }  // namespace
 }  // namespace velkui::arrange::test
+
+namespace velkui::arrange::test {
+namespace {
+
+// A thousand nested rows and columns, each holding a leaf and the next group: the staircase of
+// leaves comes out exactly, without descending the chain once per level.
+TEST(DeepTreeTest, ChainOfAThousandNestedGroupsIsArrangedExactly) {
+  constexpr int kDepth = 1000;
+  std::vector<std::unique_ptr<Box>> leaves(kDepth);
+  std::vector<std::unique_ptr<TestGroup>> groups(kDepth);
+  for (int level = kDepth - 1; level >= 0; --level) {
+    leaves[level] = std::make_unique<Box>(10.0f, 10.0f);
+    groups[level] = std::make_unique<TestGroup>(level % 2 == 0 ? Type::Row : Type::Column);
+    std::vector<IArrangeable*> children{leaves[level].get()};
+    if (level + 1 < kDepth) children.push_back(groups[level + 1].get());
+    groups[level]->Hold(children);
+  }
+  groups.front()->Arrange({0, 0, 6000, 6000});
+  for (int level = 0; level < kDepth; level += 111) {
+    EXPECT_EQ(leaves[level]->Last(), (RectF{static_cast<float>((level + 1) / 2 * 10),
+                                            static_cast<float>(level / 2 * 10), 10, 10}))
+        << level;
+  }
+}
+
+}  // namespace
+}  // namespace velkui::arrange::test

@@ -59,6 +59,8 @@ class GroupArrangement : public IArrangement {
 
   // The group is going away: stop reporting to it.
   void DetachGroup() { group_ = nullptr; }
+  // The separators are going away: stop placing them (in this arrangement and its own lines).
+  void DetachSeparators();
   const std::vector<IArrangementP>& Children() const { return children_; }
   LineAxis Axis() const { return axis_; }
 

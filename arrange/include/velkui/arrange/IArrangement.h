@@ -31,10 +31,21 @@ class IArrangement : public velkcore::RefCountedObject {
   // An outer arrangement owns its group's margins and reports position and size to the group.
   virtual bool IsOuter() const { return false; }
 
+  // Whether, on each axis it cannot grow along, the arrangement takes exactly its minimum when
+  // offered at least that much. True for leaves; lines with negative spacing break it, and so
+  // does any line holding such a line. Lets expansion stop descending where the answer is known.
+  bool ExpandsRegularly() const { return expandsRegularly_; }
+
   // x covers y when x is no larger than y in both minimum dimensions.
   bool Covers(const IArrangement& other) const {
     return MinWidth() <= other.MinWidth() && MinHeight() <= other.MinHeight();
   }
+
+ protected:
+  void SetExpandsRegularly(bool regular) { expandsRegularly_ = regular; }
+
+ private:
+  bool expandsRegularly_ = true;
 };
 
 using IArrangementP = boost::intrusive_ptr<IArrangement>;
