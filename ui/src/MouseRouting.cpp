@@ -238,10 +238,14 @@ void UI_NodeManager::UpdateMouseOverState(UI_Node& root, const MouseEvent& event
   if (IsSuspendingMouseOverUpdates()) return;
   const NodeP keepRoot = detail::Hold(&root);
   if (&root == mouseOverRoot_) lastPointer_ = event.GetPosition();
-  PointT<float> local = event.GetPosition();
-  const auto [found, position] = root.GetChildHit(true, true, &local);
-  UI_Node* leaf = found ? position->get() : &root;
-  if (leaf != mouseOverLeaf_) SetMouseOverLeafNode(leaf, &event, &root);
+  // A handler may change the tree or the state meanwhile: then the leaf under
+  // the pointer is looked for once more.
+  for (int attempt = 0; attempt < 2; ++attempt) {
+    PointT<float> local = event.GetPosition();
+    const auto [found, position] = root.GetChildHit(true, true, &local);
+    UI_Node* leaf = found ? position->get() : &root;
+    if (leaf == mouseOverLeaf_ || SetMouseOverLeafNode(leaf, &event, &root)) return;
+  }
 }
 
 void UI_NodeManager::MouseExited(const MouseEvent* event, UI_Node* root) {
@@ -265,10 +269,10 @@ void UI_NodeManager::InvalidateMouseOverNodes() {
       MouseEvent(MouseEvent::kMouseOverUpdate, 0, 0, *position, lastModifiers_));
 }
 
-void UI_NodeManager::SetMouseOverLeafNode(UI_Node* newLeaf, const MouseEvent* event,
+bool UI_NodeManager::SetMouseOverLeafNode(UI_Node* newLeaf, const MouseEvent* event,
                                           const UI_Node* eventRoot) {
   UI_Node* const oldLeaf = mouseOverLeaf_;
-  if (newLeaf == oldLeaf) return;
+  if (newLeaf == oldLeaf) return true;
   const std::uint64_t generation = ++mouseOverGeneration_;
   const NodeP keepOld = detail::Hold(oldLeaf);
   const NodeP keepNew = detail::Hold(newLeaf);
@@ -295,7 +299,7 @@ void UI_NodeManager::SetMouseOverLeafNode(UI_Node* newLeaf, const MouseEvent* ev
     if (event != nullptr) {
       DeliverExitNotice(node, *event, eventRoot);
       // A handler moved the mouse-over state itself; that update stands.
-      if (mouseOverGeneration_ != generation) return;
+      if (mouseOverGeneration_ != generation) return false;
     }
   }
   // A leaf that stays in the chain (an ancestor of the other leaf) changes
@@ -321,7 +325,9 @@ void UI_NodeManager::SetMouseOverLeafNode(UI_Node* newLeaf, const MouseEvent* ev
   }
   mouseOverLeaf_ = newLeaf;
   for (const ChainLink& link : changed) link.node->UI_MouseOverChanged();
-  if (mouseOverGeneration_ == generation) MouseOverLeafChangedForToolTips(mouseOverLeaf_);
+  if (mouseOverGeneration_ != generation) return false;
+  MouseOverLeafChangedForToolTips(mouseOverLeaf_);
+  return true;
 }
 
 void UI_NodeManager::DeliverExitNotice(UI_Node& node, const MouseEvent& event,

@@ -200,7 +200,8 @@ class UI_NodeManager {
 
   // Mouse-over state.
   void UpdateMouseOverState(UI_Node& root, const MouseEvent& event);
-  void SetMouseOverLeafNode(UI_Node* newLeaf, const MouseEvent* event, const UI_Node* eventRoot);
+  // False when a handler changed the mouse-over state meanwhile (its change stands).
+  bool SetMouseOverLeafNode(UI_Node* newLeaf, const MouseEvent* event, const UI_Node* eventRoot);
   void DeliverExitNotice(UI_Node& node, const MouseEvent& event, const UI_Node* eventRoot);
   void MouseExited(const MouseEvent* event, UI_Node* root);
   void InvalidateMouseOverNodes();
