@@ -173,4 +173,25 @@ void Wrapping(benchmark::State& state) {
 }
 BENCHMARK(Wrapping)->Arg(1000)->Unit(benchmark::kMicrosecond);
 
+void WrappingResize(benchmark::State& state) {
+  const auto leafCount = static_cast<std::size_t>(state.range(0));
+  std::vector<std::unique_ptr<Leaf>> leaves;
+  std::vector<IArrangeable*> children;
+  for (std::size_t i = 0; i < leafCount; ++i) {
+    leaves.push_back(std::make_unique<Leaf>(LeafWidth(i), LeafHeight(i)));
+    children.push_back(leaves.back().get());
+  }
+  HorizontalWrapping wrapping;
+  wrapping.SetChildren(children);
+  wrapping.Arrange({0, 0, 800, kHeight * 10});
+  bool flip = false;
+  for (auto _ : state) {
+    flip = !flip;
+    wrapping.Arrange({0, 0, flip ? 600 : 800, kHeight * 10});
+    benchmark::DoNotOptimize(leaves.back()->Placed());
+  }
+  state.SetItemsProcessed(static_cast<std::int64_t>(state.iterations() * (leafCount + 1)));
+}
+BENCHMARK(WrappingResize)->Arg(1000)->Unit(benchmark::kMicrosecond);
+
 }  // namespace

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 
+#include <velkcore/Error.h>
 #include <velkui/arrange/AbstractArrangeableGroup.h>
 
 namespace velkui::arrange::impl {
@@ -22,6 +23,11 @@ int ClampedAlignment(int alignment) {
   return alignment >= 0 && alignment <= 2 ? alignment : 0;
 }
 
+float RequireFinite(float value) {
+  velkcore::RequireInput(std::isfinite(value));
+  return value;
+}
+
 }  // namespace
 
 LineParameters ParametersFor(LineAxis axis, const AbstractArrangeableGroup& group, bool outer) {
@@ -29,19 +35,19 @@ LineParameters ParametersFor(LineAxis axis, const AbstractArrangeableGroup& grou
   const int horizontal = ClampedAlignment(static_cast<int>(group.HorizontalAlignment()));
   const int vertical = ClampedAlignment(static_cast<int>(group.VerticalAlignment()));
   if (axis == LineAxis::Horizontal) {
-    p.spacing = group.HorizontalSpacing();
+    p.spacing = RequireFinite(group.HorizontalSpacing());
     p.mainAlignment = horizontal;
     p.crossAlignment = vertical;
   } else {
-    p.spacing = group.VerticalSpacing();
+    p.spacing = RequireFinite(group.VerticalSpacing());
     p.mainAlignment = vertical;
     p.crossAlignment = horizontal;
   }
   if (outer) {
-    const float left = group.LeftMargin();
-    const float right = group.RightMargin();
-    const float top = group.TopMargin();
-    const float bottom = group.BottomMargin();
+    const float left = RequireFinite(group.LeftMargin());
+    const float right = RequireFinite(group.RightMargin());
+    const float top = RequireFinite(group.TopMargin());
+    const float bottom = RequireFinite(group.BottomMargin());
     const bool row = axis == LineAxis::Horizontal;
     p.mainMarginBefore = row ? left : top;
     p.mainMarginAfter = row ? right : bottom;
@@ -82,12 +88,10 @@ GroupArrangement::GroupArrangement(LineAxis axis, AbstractArrangeableGroup* grou
 void GroupArrangement::DetachSeparators() {
   std::fill(separators_.begin(), separators_.end(), nullptr);
   hiddenSeparators_.clear();
-  for (const IArrangementP& child : children_) {
-    // Lines of a wrapping candidate hold this group's separators; outer children belong to
-    // other groups.
-    auto* line = dynamic_cast<GroupArrangement*>(child.get());
-    if (line != nullptr && !line->outer_) line->DetachSeparators();
-  }
+  if (!holdsLines_) return;
+  // The lines hold this group's separators too.
+  for (const IArrangementP& line : children_)
+    static_cast<GroupArrangement*>(line.get())->DetachSeparators();
 }
 
 bool GroupArrangement::ExpandableMainOf(const IArrangement& a) const {
@@ -126,6 +130,10 @@ bool GroupArrangement::VerticallyExpandable() const {
 }
 
 void GroupArrangement::Compute() {
+  EnsureBestSizes();
+}
+
+void GroupArrangement::EnsureBestSizes() const {
   if (bestComputed_) return;
   double sumMain = 0;
   float maxCross = 0;
@@ -142,12 +150,12 @@ void GroupArrangement::Compute() {
 }
 
 float GroupArrangement::BestWidth() const {
-  const_cast<GroupArrangement*>(this)->Compute();
+  EnsureBestSizes();
   return IsRow() ? bestMain_ : bestCross_;
 }
 
 float GroupArrangement::BestHeight() const {
-  const_cast<GroupArrangement*>(this)->Compute();
+  EnsureBestSizes();
   return IsRow() ? bestCross_ : bestMain_;
 }
 
@@ -161,7 +169,8 @@ float GroupArrangement::ExpandedHeight(float available) const {
 
 float GroupArrangement::ExpandedMain(float available) const {
   // Nothing inside can grow: offered its minimum or more, the line takes exactly its minimum
-  // (it follows from the walk below), without descending into the children.
+  // (it follows from the walk below) and the answer needs no descent into the children, which
+  // keeps deep trees linear.
   if (!mainExpandable_ && ExpandsRegularly() && available >= minMain_) return minMain_;
   const double inner = static_cast<double>(available) - parameters_.MainMargins();
   double sum = 0;
@@ -193,17 +202,14 @@ void GroupArrangement::Distribute(float innerMain, float innerCross) {
       std::fabs(innerCross - tableSize_.y) < kSizeTolerance) {
     return;
   }
-  Compute();
   const std::size_t count = children_.size();
   table_.resize(count);
   double sum = 0;
-  usedCross_ = 0;
   for (std::size_t i = 0; i < count; ++i) {
     const IArrangement& child = *children_[i];
     Entry& entry = table_[i];
     entry.main = IsRow() ? child.BestWidth() : child.BestHeight();
     entry.cross = ExpandedCrossOf(child, innerCross);
-    if (i == 0 || entry.cross > usedCross_) usedCross_ = entry.cross;
     sum += entry.main;
   }
   const double gaps = count > 0 ? static_cast<double>(count - 1) : 0.0;

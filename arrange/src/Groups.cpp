@@ -93,9 +93,11 @@ void AddWrapped(LineAxis lineAxis, AbstractArrangeableGroup& group, const Combin
                                                       false));
       if (l > 0) stackSeparators.push_back(combination.separators[start - 1]);
     }
-    set.AddArrangement(new GroupArrangement(stackAxis, &group, std::move(lineArrangements),
-                                            std::move(stackSeparators),
-                                            combination.hiddenSeparators, stackParameters, true));
+    const boost::intrusive_ptr<GroupArrangement> stack(new GroupArrangement(
+        stackAxis, &group, std::move(lineArrangements), std::move(stackSeparators),
+        combination.hiddenSeparators, stackParameters, true));
+    stack->SetHoldsLines();
+    set.AddArrangement(stack);
   }
 }
 

@@ -142,3 +142,15 @@ for (const depth of [10, 20, 25, 30]) {
   });
   report('Wrapping/1000', ns, nodes);
 }
+
+{
+  const [root, n] = makeWrapping(1000);
+  root.calculateLayout(800, kHeight * 10, Direction.LTR);
+  let flip = false;
+  const ns = measure(() => {
+    flip = !flip;
+    root.calculateLayout(flip ? 600 : 800, kHeight * 10, Direction.LTR);
+  });
+  report('WrappingResize/1000', ns, n);
+  root.freeRecursive();
+}

@@ -59,8 +59,10 @@ class AbstractArrangeableGroup : public IArrangeable {
  protected:
   // The type's candidate builder: add this group's candidates for `combination` to `set`.
   virtual void BuildArrangements(const Combination& combination, ArrangementSet& set) = 0;
-  // How many candidates BuildArrangements makes for n children (bounds the rebuild's work).
-  virtual int CandidatesPerCombination(int childCount) const = 0;
+  // How many candidates BuildArrangements makes for n children, each costing about n steps;
+  // bounds how many combinations a rebuild builds. The default suits one candidate per line
+  // length.
+  virtual int CandidatesPerCombination(int childCount) const { return childCount; }
 
   void RebuildSelf() override;
   ArrangementSet& ArrangementsSelf() override { return arrangements_; }

@@ -61,6 +61,9 @@ class GroupArrangement : public IArrangement {
   void DetachGroup() { group_ = nullptr; }
   // The separators are going away: stop placing them (in this arrangement and its own lines).
   void DetachSeparators();
+  // The children are lines made for this arrangement (a wrapping candidate), not candidates of
+  // child groups.
+  void SetHoldsLines() { holdsLines_ = true; }
   const std::vector<IArrangementP>& Children() const { return children_; }
   LineAxis Axis() const { return axis_; }
 
@@ -91,6 +94,7 @@ class GroupArrangement : public IArrangement {
   bool IsRow() const { return axis_ == LineAxis::Horizontal; }
   float MinMainOf(const IArrangement& a) const { return IsRow() ? a.MinWidth() : a.MinHeight(); }
   float MinCrossOf(const IArrangement& a) const { return IsRow() ? a.MinHeight() : a.MinWidth(); }
+  void EnsureBestSizes() const;
   float ExpandedMain(float available) const;
   float ExpandedCross(float available) const;
   float ExpandedMainOf(const IArrangement& a, float available) const;
@@ -105,16 +109,17 @@ class GroupArrangement : public IArrangement {
 
   LineAxis axis_;
   bool outer_;
+  bool holdsLines_ = false;
   bool mainExpandable_ = false;
   bool crossExpandable_ = false;
-  bool bestComputed_ = false;
+  mutable bool bestComputed_ = false;
   bool tableComputed_ = false;
   AbstractArrangeableGroup* group_;
   LineParameters parameters_;
   float minMain_ = -1;
   float minCross_ = -1;
-  float bestMain_ = -1;
-  float bestCross_ = -1;
+  mutable float bestMain_ = -1;
+  mutable float bestCross_ = -1;
   std::vector<IArrangementP> children_;
   std::vector<ISeparator*> separators_;
   std::vector<ISeparator*> hiddenSeparators_;
@@ -123,7 +128,6 @@ class GroupArrangement : public IArrangement {
   std::vector<Entry> table_;
   PointF tableSize_{};
   double usedMain_ = 0;
-  float usedCross_ = 0;
 };
 
 class RowArrangement : public GroupArrangement {
