@@ -270,17 +270,19 @@ namespace {
 TEST(TreeLifetimeTest, HostMayChangeTheGroupWhileItIsBeingPlaced) {
   Box a(10, 10);
   Box b(10, 10);
-  TestGroup group(GroupArrangementType::Row, true);
-  group.Hold({&a, &b});
+  Box c(10, 10);
+  TestGroup group(GroupArrangementType::HorizontalWrapping, true);
+  group.Hold({&a, &b, &c});
   int calls = 0;
   a.onPlace = [&](Box&, const RectF&) {
-    if (++calls == 1) group.SetArrangementType(GroupArrangementType::Column, nullptr);
-    if (calls == 2) group.BuildSeparators();
+    // Destroys the separators the lines being placed hold, then the candidates themselves.
+    if (++calls == 1) group.BuildSeparators();
+    if (calls == 2) group.SetArrangementType(GroupArrangementType::Column, nullptr);
   };
-  group.Arrange({0, 0, 100, 100});
-  EXPECT_EQ(b.Last(), (RectF{0, 10, 10, 10}));
-  ASSERT_EQ(group.built.size(), 1u);
-  EXPECT_EQ(group.built[0]->frame, (RectF{0, 10, 10, 0}));
+  group.Arrange({0, 0, 25, 25});
+  EXPECT_EQ(c.Last(), (RectF{0, 20, 10, 10}));
+  ASSERT_EQ(group.built.size(), 2u);
+  EXPECT_EQ(group.built[1]->frame, (RectF{0, 20, 10, 0}));
 }
 
 }  // namespace
