@@ -36,6 +36,11 @@ void OSPathInterface::AddPoint(double x, double y) {
   data_.push_back(point);
 }
 
+// Room for a rounded rectangle or an ellipse without growing.
+OSPathInterface::OSPathInterface() {
+  data_.reserve(32);
+}
+
 void OSPathInterface::NoteSegment(double x0, double y0, double x1, double y1) {
   spansX_ = spansX_ || x0 != x1;
   spansY_ = spansY_ || y0 != y1;

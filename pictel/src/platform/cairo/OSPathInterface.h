@@ -16,6 +16,8 @@ class OSPathInterface : public PathInterface {
   using PathInterface::LineTo;
   using PathInterface::MoveTo;
 
+  OSPathInterface();
+
   void MoveTo(const velkcore::PointT<float>& point) override;
   void LineTo(const velkcore::PointT<float>& point) override;
   void BezierTo(const velkcore::PointT<float>& control1, const velkcore::PointT<float>& control2,
