@@ -84,17 +84,6 @@ TEST(InvalidateTest, BurstOfInvalidationsInsideOneCallArrangesOnce) {
   EXPECT_TRUE(outer.IsValid());
 }
 
-TEST(InvalidateTest, ChangedLeafIsMeasuredAgain) {
-  Box a(10, 10);
-  Box b(10, 10);
-  TestGroup row(Type::Row);
-  row.Hold({&a, &b});
-  row.Arrange({0, 0, 100, 10});
-  a.Resize(30, 10);
-  a.Invalidate();
-  EXPECT_EQ(b.Last(), (RectF{30, 0, 10, 10}));
-}
-
 TEST(InvalidateTest, InvalidationWhileTheHostDisabledArrangementDoesNotEnableIt) {
   Box a(10, 10);
   TestGroup row(Type::Row);

@@ -7,19 +7,6 @@ namespace {
 
 using Type = GroupArrangementType;
 
-TEST(HorizontalWrappingTest, BuildsOneCandidatePerLineLengthThatIsNotCovered) {
-  Box a(10, 10);
-  Box b(10, 10);
-  Box c(10, 10);
-  TestGroup wrap(Type::HorizontalWrapping);
-  wrap.Hold({&a, &b, &c});
-  const auto& set = wrap.Arrangements();
-  // k = 1: 10x30, k = 2: 20x20, k = 3: 30x10.
-  ASSERT_EQ(set.Size(), 3u);
-  EXPECT_FLOAT_EQ(set[1]->MinWidth(), 20);
-  EXPECT_FLOAT_EQ(set[1]->MinHeight(), 20);
-}
-
 TEST(HorizontalWrappingTest, TwoPerLineWhenOnlyTwoFitSideBySide) {
   Box a(10, 10);
   Box b(10, 10);
