@@ -106,5 +106,17 @@ TEST(EmptyGroupTest, IsLeftOutOfItsParentAndItsGapSeparatorCollapses) {
   EXPECT_EQ(row.built[0]->frame.width, 0);
 }
 
+TEST(EmptyGroupTest, NestedGroupFirstOfferedNothingStillPlacesItsChildren) {
+  Box dot(0, 0);
+  TestGroup nested(Type::Row);
+  nested.Hold({&dot});
+  Box a(10, 10);
+  TestGroup row(Type::Row);
+  row.Hold({&a, &nested});
+  row.Arrange({0, 0, 50, 10});
+  ASSERT_EQ(dot.places.size(), 1u);
+  EXPECT_EQ(dot.Last(), (RectF{10, 0, 0, 0}));
+}
+
 }  // namespace
 }  // namespace velkui::arrange::test
