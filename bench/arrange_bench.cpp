@@ -187,7 +187,7 @@ void WrappingResize(benchmark::State& state) {
   bool flip = false;
   for (auto _ : state) {
     flip = !flip;
-    wrapping.Arrange({0, 0, flip ? 600 : 800, kHeight * 10});
+    wrapping.Arrange({0, 0, flip ? 600.0f : 800.0f, kHeight * 10});
     benchmark::DoNotOptimize(leaves.back()->Placed());
   }
   state.SetItemsProcessed(static_cast<std::int64_t>(state.iterations() * (leafCount + 1)));
