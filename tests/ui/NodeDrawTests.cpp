@@ -243,6 +243,7 @@ TEST_F(NodeDrawTest, InvalidationClimbsWithTheAreaMappedIntoEachParent) {
   auto parent = View("parent", root.get(), {100, 50, 200, 200});
   parent->UI_SetMatrix({0, 0, 2, 2});
   auto child = View("child", parent.get(), {10, 10, 40, 40});
+  Paint();  // nothing pending any more
   root->invalidations = 0;
   const RectT<std::int32_t> part{5, 5, 100, 10};  // clipped to the child's 40 x 40
   child->UI_Invalidate(&part, InvalidateFlags{});
@@ -257,6 +258,31 @@ TEST_F(NodeDrawTest, InvalidationClimbsWithTheAreaMappedIntoEachParent) {
   root->invalidations = 0;
   child->UI_Invalidate(nullptr, InvalidateFlags{});
   EXPECT_EQ(root->invalidations, 0);
+}
+
+TEST_F(NodeDrawTest, RepeatedInvalidationsBetweenPaintsTravelUpOnce) {
+  auto parent = View("parent", root.get(), {100, 50, 200, 200});
+  auto child = View("child", parent.get(), {10, 10, 40, 40});
+  const auto invalidateChild = [&](const RectT<std::int32_t>* area) {
+    child->UI_Invalidate(area, InvalidateFlags{});
+  };
+  Paint();
+  root->invalidations = 0;
+  invalidateChild(nullptr);
+  invalidateChild(nullptr);
+  const RectT<std::int32_t> part{0, 0, 10, 10};
+  invalidateChild(&part);  // inside what is already asked for
+  EXPECT_EQ(root->invalidations, 1);
+
+  child->UI_SetMatrix({5, 0, 1, 1});  // the old place is pending already; the new one is not
+  EXPECT_EQ(root->invalidations, 2);
+  invalidateChild(nullptr);
+  EXPECT_EQ(root->invalidations, 2);
+
+  Paint();  // a new generation: the same request travels again
+  invalidateChild(nullptr);
+  EXPECT_EQ(root->invalidations, 3);
+  EXPECT_EQ(root->lastInvalidRect, (RectT<std::int32_t>{115, 60, 40, 40}));
 }
 
 }  // namespace

@@ -380,6 +380,56 @@ TEST_F(NodeTreeTest, RecursiveHitFindsTheDeepestNode) {
   EXPECT_EQ(p, (PointT<float>{5, 5}));
 }
 
+class SometimesShownView : public LoggingView {
+ public:
+  using LoggingView::LoggingView;
+  bool visible = true;
+  bool UI_IsShown() const override { return visible && LoggingView::UI_IsShown(); }
+  void SetVisible(bool v) {
+    visible = v;
+    UI_GeometryChanged();
+  }
+};
+
+TEST_F(NodeTreeTest, HitTestingFollowsEveryChangeOfPlaceSizeOrderAndVisibility) {
+  auto root = View("root", nullptr, {0, 0, 500, 500});
+  auto a = View("a", root.get(), {0, 0, 50, 50});
+  auto b = View("b", root.get(), {100, 0, 50, 50});
+  const auto hitAt = [&](float x, float y) -> std::string {
+    PointT<float> p{x, y};
+    const auto [found, position] = root->GetChildHit(true, false, &p);
+    return found ? (*position)->UI_GetNodeID() : "none";
+  };
+  EXPECT_EQ(hitAt(10, 10), "a");
+  a->UI_SetLocalRectF({200, 200, 50, 50});
+  EXPECT_EQ(hitAt(10, 10), "none");
+  EXPECT_EQ(hitAt(210, 210), "a");
+  b->UI_SetLocalRectF({190, 190, 50, 50});
+  EXPECT_EQ(hitAt(210, 210), "b");
+  root->ChildSwapOrder(0, 1);
+  EXPECT_EQ(hitAt(210, 210), "a");
+  a->UI_Show(false);
+  EXPECT_EQ(hitAt(210, 210), "b");
+  a->UI_Show(true);
+  b->UI_SetMatrix({0, 0, 0.5f, 0.5f});  // now 95..120
+  EXPECT_EQ(hitAt(100, 100), "b");
+  EXPECT_EQ(hitAt(150, 150), "none");
+  root->UI_SetMatrix({10, 10, 1, 1});
+  root->UI_SetMatrixOnlyForChildren(true);  // every child moves by 10, 10
+  EXPECT_EQ(hitAt(100, 100), "none");
+  EXPECT_EQ(hitAt(115, 115), "b");
+  root->ChildRemove(b.get());
+  EXPECT_EQ(hitAt(115, 115), "none");
+
+  auto custom = MakeView<SometimesShownView>(root.get(), {0, 0, 20, 20}, "custom", log);
+  EXPECT_EQ(hitAt(15, 25), "custom");  // 10..30 through the root's matrix
+  custom->SetVisible(false);
+  EXPECT_EQ(hitAt(15, 25), "none");
+  auto inner = View("inner", custom.get(), {0, 0, 5, 5});
+  custom->SetVisible(true);
+  EXPECT_EQ(hitAt(12, 12), "inner");
+}
+
 // ---- Layout bridge ----
 
 TEST_F(NodeTreeTest, PlacementSetsTheFrameWithOutsetsAndIsAnsweredBack) {

@@ -282,7 +282,8 @@ bool UI_NodeManager::SetMouseOverLeafNode(UI_Node* newLeaf, const MouseEvent* ev
   bool newLeafShared = false;
   StripCommonAncestors(oldChain, newChain, &oldLeafShared, &newLeafShared);
 
-  NodeChain changed;
+  // Held by the chains (and the two leaves by keepOld and keepNew).
+  NodeList changed;
   const auto invalidateIfAsked = [](UI_Node& node, bool isLeaf) {
     if (node.UI_InvalidateOnMouseOverChange(isLeaf)) node.UI_Invalidate(nullptr, InvalidateFlags{});
   };
@@ -294,7 +295,7 @@ bool UI_NodeManager::SetMouseOverLeafNode(UI_Node* newLeaf, const MouseEvent* ev
     invalidateIfAsked(node, isLeaf);
     if (wasOver) {
       node.SetMouseOverState(false);
-      changed.push_back(link);
+      changed.push_back(&node);
     }
     if (event != nullptr) {
       DeliverExitNotice(node, *event, eventRoot);
@@ -306,7 +307,7 @@ bool UI_NodeManager::SetMouseOverLeafNode(UI_Node* newLeaf, const MouseEvent* ev
   // only its leaf status.
   if (oldLeafShared && !oldLeaf->dying_) {
     invalidateIfAsked(*oldLeaf, true);
-    changed.push_back({oldLeaf, keepOld});
+    changed.push_back(oldLeaf);
   }
   for (const ChainLink& link : newChain) {
     UI_Node& node = *link.node;
@@ -316,15 +317,15 @@ bool UI_NodeManager::SetMouseOverLeafNode(UI_Node* newLeaf, const MouseEvent* ev
     invalidateIfAsked(node, isLeaf);
     if (!wasOver) {
       node.SetMouseOverState(true);
-      changed.push_back(link);
+      changed.push_back(&node);
     }
   }
   if (newLeafShared) {
     invalidateIfAsked(*newLeaf, true);
-    changed.push_back({newLeaf, keepNew});
+    changed.push_back(newLeaf);
   }
   mouseOverLeaf_ = newLeaf;
-  for (const ChainLink& link : changed) link.node->UI_MouseOverChanged();
+  for (UI_Node* node : changed) node->UI_MouseOverChanged();
   if (mouseOverGeneration_ != generation) return false;
   MouseOverLeafChangedForToolTips(mouseOverLeaf_);
   return true;

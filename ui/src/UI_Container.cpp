@@ -83,6 +83,7 @@ void UI_Container::InsertAt(std::size_t index, const NodePtr& node) {
   index = std::min(index, children_.size());
   node->UI_SetIndex(static_cast<std::int32_t>(index));
   children_.insert(children_.begin() + static_cast<std::ptrdiff_t>(index), node);
+  InvalidateChildBoxes();
   Renumber(index + 1, children_.size());
   ChildAdded(node.get());
 }
@@ -96,6 +97,7 @@ UI_Container::NodePtr UI_Container::ChildRemove(const_iterator position) {
   if (found == children_.end()) return child;
   const auto index = static_cast<std::size_t>(found - children_.begin());
   children_.erase(found);
+  InvalidateChildBoxes();
   Renumber(index, children_.size());
   child->UI_SetParent(nullptr);
   child->UI_SetIndex(-1);
@@ -128,6 +130,7 @@ void UI_Container::ChildMove(std::int32_t from, std::int32_t to) {
   }
   Renumber(static_cast<std::size_t>(std::min(from, to)),
            static_cast<std::size_t>(std::max(from, to)) + 1);
+  InvalidateChildBoxes();
   ChildOrderChanged();
 }
 
@@ -138,6 +141,7 @@ void UI_Container::ChildSwapOrder(std::int32_t i, std::int32_t j) {
   std::swap(children_[static_cast<std::size_t>(i)], children_[static_cast<std::size_t>(j)]);
   children_[static_cast<std::size_t>(i)]->UI_SetIndex(i);
   children_[static_cast<std::size_t>(j)]->UI_SetIndex(j);
+  InvalidateChildBoxes();
   ChildOrderChanged();
 }
 
@@ -155,23 +159,74 @@ void UI_Container::Renumber(std::size_t from, std::size_t to) {
   }
 }
 
+void UI_Container::InvalidateChildBox(std::int32_t index) const {
+  if (index < 0 || static_cast<std::size_t>(index) >= boxes_.size()) {
+    allBoxesStale_ = true;
+    return;
+  }
+  boxes_[static_cast<std::size_t>(index)].stale = true;
+  someBoxesStale_ = true;
+}
+
+void UI_Container::InvalidateChildBoxes() const {
+  allBoxesStale_ = true;
+}
+
+UI_Container::ChildBox UI_Container::MeasureChild(const UI_Node& child) {
+  ChildBox box;
+  box.stale = false;
+  box.ownsPlatformWindow = child.UI_ReceivesEventsFromOS();
+  if (!child.UI_IsShown()) return box;
+  const velkcore::ScaleMatrixT<float> m = child.UI_GetSelfToParentMatrix();
+  if (detail::IsDegenerate(m)) return box;
+  const velkcore::RectT<float> r = detail::TransformRect(m, child.UI_GetLocalRectF(false));
+  box.left = r.left;
+  box.top = r.top;
+  box.right = r.left + r.width;
+  box.bottom = r.top + r.height;
+  box.toParent = m;
+  box.visible = true;
+  return box;
+}
+
+const std::vector<UI_Container::ChildBox>& UI_Container::GetChildBoxes() const {
+  if (allBoxesStale_ || boxes_.size() != children_.size()) {
+    boxes_.resize(children_.size());
+    for (std::size_t i = 0; i < children_.size(); ++i) boxes_[i] = MeasureChild(*children_[i]);
+  } else if (someBoxesStale_) {
+    for (std::size_t i = 0; i < boxes_.size(); ++i) {
+      if (boxes_[i].stale) boxes_[i] = MeasureChild(*children_[i]);
+    }
+  }
+  allBoxesStale_ = false;
+  someBoxesStale_ = false;
+  return boxes_;
+}
+
 std::pair<bool, UI_Container::const_iterator> UI_Container::GetChildHit(
     bool recursive, bool skipOSChildren, velkcore::PointT<float>* point) const {
   velkcore::RequireInput(point != nullptr);
+  // Float rounding must not lose a point on an edge: the exact test follows.
+  constexpr float kSlack = 0.01f;
   std::pair<bool, const_iterator> result{false, children_.end()};
   const UI_Container* level = this;
   for (;;) {
+    const std::vector<ChildBox>& boxes = level->GetChildBoxes();
+    const velkcore::PointT<float> p = *point;
     bool hit = false;
-    const ChildVector& children = level->children_;
-    for (auto it = children.end(); it != children.begin();) {
-      --it;
-      const UI_Node& child = **it;
-      if (skipOSChildren && child.UI_ReceivesEventsFromOS()) continue;
-      if (!child.UI_IsShown()) continue;
-      const auto local = detail::InverseTransform(child.UI_GetSelfToParentMatrix(), *point);
-      if (!local || !child.UI_HitTest(*local)) continue;
-      *point = *local;
-      result = {true, it};
+    for (std::size_t i = boxes.size(); i-- > 0;) {
+      const ChildBox& box = boxes[i];
+      if (!box.visible || (skipOSChildren && box.ownsPlatformWindow)) continue;
+      if (p.x < box.left - kSlack || p.x >= box.right + kSlack || p.y < box.top - kSlack ||
+          p.y >= box.bottom + kSlack) {
+        continue;
+      }
+      const UI_Node& child = *level->children_[i];
+      const velkcore::PointT<float> local{(p.x - box.toParent.tx) / box.toParent.sx,
+                                          (p.y - box.toParent.ty) / box.toParent.sy};
+      if (!child.UI_HitTest(local)) continue;
+      *point = local;
+      result = {true, level->children_.begin() + static_cast<std::ptrdiff_t>(i)};
       level = &child;
       hit = true;
       break;

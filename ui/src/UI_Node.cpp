@@ -388,6 +388,10 @@ UI_Node* UI_Node::UI_ChildGetFromID(const std::string& id) const {
 
 // ---- State ----
 
+void UI_Node::UI_GeometryChanged() const {
+  if (parent_ != nullptr) parent_->InvalidateChildBox(index_);
+}
+
 void UI_Node::UI_SetDisabled(bool disabled) {
   if (stateFlags_.IsSet(kStateSelfDisabled) == disabled) return;
   stateFlags_.Set(kStateSelfDisabled, disabled);

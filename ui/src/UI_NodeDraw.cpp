@@ -26,21 +26,18 @@ pictel::SurfaceInterface& RequireSurface(pictel::Pictel* context) {
   return *context->GetSurface();
 }
 
-// Whether a child that `toParent` maps from its own rectangle `local` cannot
-// share a whole unit with `clip` (parent coordinates). Conservative: the exact
-// test runs in the child's coordinates on rectangles rounded outwards there, so
-// two child units of slack (plus one for the parent's rounding) are allowed.
-bool IsSurelyOutsideClip(const ScaleMatrixT<float>& toParent, const RectT<float>& local,
-                         const RectT<std::int32_t>& clip) {
-  const RectT<float> mapped = detail::TransformRect(toParent, local);
-  const float slackX = 2.0f * std::fabs(toParent.sx) + 1.0f;
-  const float slackY = 2.0f * std::fabs(toParent.sy) + 1.0f;
-  const auto clipLeft = static_cast<float>(clip.left);
-  const auto clipTop = static_cast<float>(clip.top);
-  const auto clipRight = static_cast<float>(clip.left + clip.width);
-  const auto clipBottom = static_cast<float>(clip.top + clip.height);
-  return mapped.left + mapped.width + slackX <= clipLeft || mapped.left - slackX >= clipRight ||
-         mapped.top + mapped.height + slackY <= clipTop || mapped.top - slackY >= clipBottom;
+// Whether a child whose box (this node's coordinates) is `box` cannot share a
+// whole unit with `clip`. Conservative: the exact test runs in the child's
+// coordinates on rectangles rounded outwards there, so two child units of slack
+// (plus one for the parent's own rounding) are allowed.
+template <typename Box>
+bool IsSurelyOutsideClip(const Box& box, const RectT<std::int32_t>& clip) {
+  const float slackX = 2.0f * std::fabs(box.toParent.sx) + 1.0f;
+  const float slackY = 2.0f * std::fabs(box.toParent.sy) + 1.0f;
+  return box.right + slackX <= static_cast<float>(clip.left) ||
+         box.left - slackX >= static_cast<float>(clip.left + clip.width) ||
+         box.bottom + slackY <= static_cast<float>(clip.top) ||
+         box.top - slackY >= static_cast<float>(clip.top + clip.height);
 }
 
 }  // namespace
@@ -48,28 +45,30 @@ bool IsSurelyOutsideClip(const ScaleMatrixT<float>& toParent, const RectT<float>
 void UI_Node::DrawChildren(pictel::Pictel* context) const {
   pictel::SurfaceInterface& surface = RequireSurface(context);
   const RectT<std::int32_t> clip = surface.GetClipBounds();
-  // By index: a child's drawing must not change the tree, but if it does the
-  // loop stays within the list.
-  for (std::size_t i = 0; i < ChildSize(); ++i) DrawChild(*ChildGet(i), context, &clip);
+  // Children that cannot reach the clip are passed over on their cached boxes,
+  // before any of their code runs. By index: drawing must not change the tree,
+  // but if it does the loop stays within the list.
+  for (std::size_t i = 0; i < ChildSize(); ++i) {
+    const ChildBox box = GetChildBoxes()[i];
+    if (!box.visible || box.ownsPlatformWindow || IsSurelyOutsideClip(box, clip)) continue;
+    DrawChild(*ChildGet(i), context);
+  }
 }
 
 void UI_Node::UI_DispatchDrawToChild(const UI_Node& child, pictel::Pictel* context) const {
-  DrawChild(child, context, nullptr);
+  DrawChild(child, context);
 }
 
-void UI_Node::DrawChild(const UI_Node& child, pictel::Pictel* context,
-                        const RectT<std::int32_t>* parentClip) const {
+void UI_Node::DrawChild(const UI_Node& child, pictel::Pictel* context) const {
   if (child.UI_ReceivesEventsFromOS() || !child.UI_IsShown()) return;
   const ScaleMatrixT<float> toParent = child.UI_GetSelfToParentMatrix();
   if (detail::IsDegenerate(toParent)) return;
-  const RectT<float> local = child.UI_GetLocalRectF(false);
-  if (parentClip != nullptr && IsSurelyOutsideClip(toParent, local, *parentClip)) return;
 
   pictel::SurfaceInterface& surface = RequireSurface(context);
   const NodeP keep = detail::Hold(&child);
   const pictel::ScopedSurfaceState state(surface);
   surface.Transform(detail::ToAffine(toParent));
-  if (!surface.IsWithinClipBounds(detail::RoundOut(local))) return;
+  if (!surface.IsWithinClipBounds(detail::RoundOut(child.UI_GetLocalRectF(false)))) return;
   UI_DrawAndCache(child, context, false, nullptr);
 }
 
@@ -82,6 +81,17 @@ void UI_Node::UI_DispatchDraw(pictel::Pictel* context) const {
 void UI_Node::UI_DispatchDrawFromRoot(const pictel::ColorRGBA& background, pictel::Pictel* context,
                                       bool backgroundMode) const {
   RequireSurface(context);
+  // A paint ends a generation of invalidations: requests made before it (and
+  // during it) must travel up again afterwards.
+  struct GenerationBoundary {
+    explicit GenerationBoundary(UI_NodeManager* m) : manager(m) { Advance(); }
+    ~GenerationBoundary() { Advance(); }
+    void Advance() const {
+      if (manager != nullptr) manager->IncrementPictelCacheSeed();
+    }
+    UI_NodeManager* manager;
+  };
+  const GenerationBoundary boundary(UI_NodeManager::Get(false));
   UI_DrawAndCache(*this, context, backgroundMode, &background);
 }
 

@@ -80,6 +80,7 @@ void UI_SubView::UI_SetLocalRectF(const RectT<float>& rect) {
   UI_Invalidate(nullptr, InvalidateFlags{});
   const RectT<float> old = localRect_;
   localRect_ = rect;
+  UI_GeometryChanged();
   UI_Invalidate(nullptr, InvalidateFlags{});
   UI_SizeChanged(localRect_);
   UI_DispatchNodeChange(NodeChange::kFrameChanged);
@@ -118,6 +119,7 @@ void UI_SubView::UI_Show(bool show) {
   const NodeP keep = detail::Hold(this);
   if (viewFlags_.IsSet(kViewShown)) UI_Invalidate(nullptr, InvalidateFlags{});
   viewFlags_.Set(kViewShown, show);
+  UI_GeometryChanged();
   if (show) UI_Invalidate(nullptr, InvalidateFlags{});
   UI_InvalidatePictelCache(true);
   UI_DispatchNodeChange(NodeChange::kShownChanged);
@@ -135,7 +137,7 @@ void UI_SubView::UI_Invalidate(const RectT<std::int32_t>* localOrNull, Invalidat
     if (area.width > 0 && area.height > 0) {
       const RectT<std::int32_t> inParent = detail::RoundOut(
           detail::TransformRect(UI_GetSelfToParentMatrix(), detail::ToFloat(area)));
-      if (inParent.width > 0 && inParent.height > 0) {
+      if (inParent.width > 0 && inParent.height > 0 && !IsAreaAlreadyRequested(*parent, inParent)) {
         // Only the node that starts the request may keep its cached pixels:
         // every ancestor's cache holds this node's old drawing.
         InvalidateFlags parentFlags = flags;
@@ -145,6 +147,19 @@ void UI_SubView::UI_Invalidate(const RectT<std::int32_t>* localOrNull, Invalidat
     }
   }
   UI_Node::UI_Invalidate(localOrNull, flags);
+}
+
+bool UI_SubView::IsAreaAlreadyRequested(const UI_Node& parent, const RectT<std::int32_t>& area) {
+  const UI_NodeManager* manager = UI_NodeManager::GetConst(false);
+  if (manager == nullptr) return false;
+  const std::uint64_t seed = manager->GetPictelCacheSeed();
+  const bool covered = requestedSeed_ == seed && requestedParent_ == &parent &&
+                       velkcore::Intersection(requestedArea_, area) == area;
+  if (covered) return true;
+  requestedSeed_ = seed;
+  requestedParent_ = &parent;
+  requestedArea_ = area;
+  return false;
 }
 
 void UI_SubView::UI_UpdateNow(UpdateFlags flags) {
@@ -220,6 +235,8 @@ void UI_SubView::UI_SetMatrix(const ScaleMatrixT<float>& matrix) {
   const InvalidateFlags keepOwnPixels{kInvalidateKeepOwnCache};
   UI_Invalidate(nullptr, keepOwnPixels);
   matrix_ = matrix;
+  UI_GeometryChanged();
+  if (matrixOnlyForChildren_) InvalidateChildBoxes();
   UI_Invalidate(nullptr, keepOwnPixels);
   UI_DispatchNodeChange(NodeChange::kFrameChanged);
 }
@@ -230,6 +247,8 @@ void UI_SubView::UI_SetMatrixOnlyForChildren(bool onlyForChildren) {
   // Both this node's pixels and its children's placement change.
   UI_Invalidate(nullptr, InvalidateFlags{});
   matrixOnlyForChildren_ = onlyForChildren;
+  UI_GeometryChanged();
+  InvalidateChildBoxes();
   UI_Invalidate(nullptr, InvalidateFlags{});
   UI_DispatchNodeChange(NodeChange::kFrameChanged);
 }

@@ -66,8 +66,16 @@ class UI_Container {
   // coordinates); with `recursive`, the deepest node under it. On success
   // `*point` is rewritten into the coordinates of the node found, which is
   // `*position` (an iterator into the child list of that node's parent).
+  // Only points inside a child's own rectangle are offered to its UI_HitTest.
   std::pair<bool, const_iterator> GetChildHit(bool recursive, bool skipOSChildren,
                                               velkcore::PointT<float>* point) const;
+
+  // Children's boxes are cached for hit testing and clip tests. A child whose
+  // answers to UI_IsShown, UI_GetSelfToParentMatrix, UI_GetLocalRectF or
+  // UI_ReceivesEventsFromOS change calls UI_Node::UI_GeometryChanged (the
+  // sub-view setters do); these mark the cached box stale.
+  void InvalidateChildBox(std::int32_t index) const;
+  void InvalidateChildBoxes() const;
 
   virtual void ChildAdded(UI_Node* node);
   virtual void ChildRemoved(UI_Node* node);
@@ -81,13 +89,33 @@ class UI_Container {
   // Used by UI_Node so that GetAsANode needs no virtual call.
   explicit UI_Container(UI_Node* selfNode);
 
+  // Where a child lies in this container's coordinates (its frame through its
+  // self-to-parent matrix, which is kept too), and whether it can be hit or
+  // drawn at all.
+  struct ChildBox {
+    float left = 0;
+    float top = 0;
+    float right = 0;
+    float bottom = 0;
+    velkcore::ScaleMatrixT<float> toParent;
+    bool visible = false;  // shown with a non-degenerate scale
+    bool ownsPlatformWindow = false;
+    bool stale = true;
+  };
+  const std::vector<ChildBox>& GetChildBoxes() const;
+
  private:
   void InsertAt(std::size_t index, const NodePtr& node);
   void RequireAdoptable(const UI_Node* node) const;
   void Renumber(std::size_t from, std::size_t to);
 
+  static ChildBox MeasureChild(const UI_Node& child);
+
   ChildVector children_;
   UI_Node* const selfNode_;
+  mutable std::vector<ChildBox> boxes_;
+  mutable bool allBoxesStale_ = true;
+  mutable bool someBoxesStale_ = true;
 };
 
 }  // namespace velkui::ui

@@ -42,7 +42,8 @@ class UI_Node : public UI_NodeBase {
   // ---- Virtual operations, in slot order ----
   /* 1 */ virtual bool UI_IsSubView() const;
   /* 2 */ virtual velkcore::ScaleMatrixT<float> UI_GetSelfToParentMatrix() const = 0;
-  // `local` is in the node's own coordinates.
+  // `local` is in the node's own coordinates. Only points inside the node's own
+  // rectangle are asked about: an override may narrow the hit area, not widen it.
   /* 3 */ virtual bool UI_HitTest(const velkcore::PointT<float>& local) const;
   /* 4 */ virtual velkcore::RectT<std::int32_t> UI_GetLocalRect(bool inParent) const = 0;
   /* 5 */ virtual velkcore::RectT<float> UI_GetLocalRectF(bool inParent) const = 0;
@@ -147,6 +148,12 @@ class UI_Node : public UI_NodeBase {
   // Direct children only; the first exact match in z-order.
   const_iterator UI_ChildFindFromID(const std::string& id) const;
   UI_Node* UI_ChildGetFromID(const std::string& id) const;
+
+  // Tells the parent that this node's place, size or visibility changed. The
+  // sub-view setters call it; a class that overrides UI_IsShown,
+  // UI_GetSelfToParentMatrix, UI_GetLocalRectF or UI_ReceivesEventsFromOS calls
+  // it whenever their answers change.
+  void UI_GeometryChanged() const;
 
   // ---- Identity and state ----
   void UI_SetNodeID(std::string id) { nodeID_ = std::move(id); }
@@ -274,10 +281,7 @@ class UI_Node : public UI_NodeBase {
   void CollectOSControlClipRects(const velkcore::ScaleMatrixT<float>& toTop,
                                  OSControlClipRects* rects) const;
   void DrawChildren(pictel::Pictel* context) const;
-  // `parentClip`: the clip bounds in this node's coordinates, when known; used
-  // to skip children that cannot touch the clip without touching the surface.
-  void DrawChild(const UI_Node& child, pictel::Pictel* context,
-                 const velkcore::RectT<std::int32_t>* parentClip) const;
+  void DrawChild(const UI_Node& child, pictel::Pictel* context) const;
 
   UI_Container* parent_ = nullptr;
   std::int32_t index_ = -1;

@@ -7,6 +7,8 @@
 #include <utility>
 #include <vector>
 
+#include <boost/container/small_vector.hpp>
+
 #include <velkcore/Geometry.h>
 #include <velkcore/SharedFunctions.h>
 #include <velkui/ui/CustomSettingsManager.h>
@@ -177,7 +179,8 @@ class UI_NodeManager {
     NodeP hold;
   };
   // A node and its ancestors, nearest first.
-  using NodeChain = std::vector<ChainLink>;
+  using NodeChain = boost::container::small_vector<ChainLink, 16>;
+  using NodeList = boost::container::small_vector<UI_Node*, 16>;
   static ChainLink MakeLink(UI_Node* node);
   static NodeChain BuildChain(UI_Node* leaf);
   // Drops the ancestors both chains share; tells whether each leaf was among them.

@@ -57,6 +57,9 @@ class UI_SubView : public UI_Node {
 
  private:
   void RemoveSubtreeTimers();
+  // Whether `area` (parent coordinates) was already asked of `parent` in this
+  // repaint generation; records it otherwise.
+  bool IsAreaAlreadyRequested(const UI_Node& parent, const velkcore::RectT<std::int32_t>& area);
 
   ViewFlags viewFlags_;
   LayoutBinding layoutBinding_;
@@ -64,6 +67,10 @@ class UI_SubView : public UI_Node {
   velkcore::RectT<float> localRect_;
   velkcore::ScaleMatrixT<float> matrix_;
   bool matrixOnlyForChildren_ = false;
+  // The last area this node asked its parent to repaint, and when.
+  std::uint64_t requestedSeed_ = 0;
+  const UI_Node* requestedParent_ = nullptr;
+  velkcore::RectT<std::int32_t> requestedArea_;
 };
 
 }  // namespace velkui::ui
