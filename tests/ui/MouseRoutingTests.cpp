@@ -161,6 +161,8 @@ TEST_F(MouseRoutingTest, TheProxyBecomesTheTargetAndTheRecorderSeesItFirst) {
   EXPECT_EQ(recorder->mouse[0].second, (PointT<float>{25, 30}));
   EXPECT_EQ(manager->GetMouseOverRootNode(), parent.get());
   EXPECT_EQ(*log, (EventLog{"leaf:mouse(leaf,3)", "parent:mouse(leaf,3)", "window:mouse(leaf,3)"}));
+  UI_Node::UI_DispatchKeyboardEvent(leaf.get(), Key(KeyboardEvent::kKeyDown, 65));
+  EXPECT_EQ(recorder->keys, 1);
   manager->SetEventRecorder(nullptr);
 }
 

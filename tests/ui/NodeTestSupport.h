@@ -172,6 +172,11 @@ class FakeManager : public UI_NodeManager {
   std::vector<std::string> toolTipDisposals;
   int pendingKeyboardRemovals = 0;
   std::optional<PointT<float>> pointer;
+  std::vector<std::string> timerRemovals;
+  std::vector<std::string> toolTipChanges;
+
+  void RemoveNodeTimers(UI_Node& node) override { timerRemovals.push_back(node.UI_GetNodeID()); }
+  void ToolTipChanged(UI_Node& node) override { toolTipChanges.push_back(node.UI_GetNodeID()); }
 
   void MouseOverLeafChangedForToolTips(UI_Node* leaf) override { toolTipLeaves.push_back(leaf); }
   void SuspendToolTips(bool suspend) override { toolTipSuspensions.push_back(suspend); }

@@ -11,6 +11,7 @@
 
 #include <velkcore/Geometry.h>
 #include <velkcore/SharedFunctions.h>
+#include <velkui/pictel/PictelImageResourceCache.h>
 #include <velkui/ui/CustomSettingsManager.h>
 #include <velkui/ui/InputCapture.h>
 #include <velkui/ui/NodeTypes.h>
@@ -110,6 +111,8 @@ class UI_NodeManager {
   void EnableMnemonics() { mnemonicsEnabled_ = true; }
   void DisableMnemonics() { mnemonicsEnabled_ = false; }
   bool IsMnemonicEnabled() const { return mnemonicsEnabled_; }
+  // Decoded resource images, per supplier type.
+  utility::PictelImageResourceCache& GetPictelImageResourceCache() { return imageCache_; }
   CustomSettingsManager& GetCustomSettingsManager() { return customSettings_; }
   const CustomSettingsManager& GetCustomSettingsManager() const { return customSettings_; }
   // The automation recorder's hook; null removes it.
@@ -238,6 +241,7 @@ class UI_NodeManager {
   std::vector<const OS_Window*> suspendedMouseActivates_;
   bool frontmost_ = true;
   std::int32_t userResizing_ = 0;
+  utility::PictelImageResourceCache imageCache_;
   CustomSettingsManager customSettings_;
   std::uint64_t pictelCacheSeed_ = 1;
   std::int32_t nextTimerID_ = -2;
