@@ -1,5 +1,9 @@
 function(velkui_set_warnings target)
   target_compile_options(${target} PRIVATE -Wall -Wextra -Wpedantic)
+  if(CMAKE_CXX_COMPILER_ID STREQUAL "GNU" AND CMAKE_CXX_COMPILER_VERSION VERSION_LESS 13)
+    # g++ 12 reports std::string concatenation at -O3 as overlapping memcpy (GCC bug 105651).
+    target_compile_options(${target} PRIVATE -Wno-restrict)
+  endif()
   if(VELKUI_WERROR)
     target_compile_options(${target} PRIVATE -Werror)
   endif()
