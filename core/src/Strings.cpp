@@ -163,6 +163,11 @@ UTF16String StripDisplayString(std::u16string_view text) {
   return out;
 }
 
+const UTF16String& GetLineEnding() {
+  static const UTF16String lineEnding = u"\n";
+  return lineEnding;
+}
+
 bool HasNumericChars(std::u16string_view text) {
   for (const char16_t c : text) {
     if (c >= u'0' && c <= u'9') return true;

@@ -141,9 +141,4 @@ void GeneratePathEllipsisString(const UTF16String& text, std::uint32_t count, UT
   }
 }
 
-const UTF16String& GetLineEnding() {
-  static const UTF16String lineEnding = u"\n";
-  return lineEnding;
-}
-
 }  // namespace velkui::pictel

@@ -40,6 +40,9 @@ std::size_t LocateSingleAmpersandInString(std::u16string_view text);
 // The text as it is shown: single ampersands removed and "&&" collapsed to "&".
 UTF16String StripDisplayString(std::u16string_view text);
 
+// The platform's line ending in multi-line text ("\n" on Linux).
+const UTF16String& GetLineEnding();
+
 // True when the text holds at least one decimal digit.
 bool HasNumericChars(std::u16string_view text);
 

@@ -19,7 +19,7 @@ velkcore::UTF16String TruncateString(const FontInterface& font, const char16_t* 
 void GeneratePathEllipsisString(const velkcore::UTF16String& text, std::uint32_t count,
                                 velkcore::UTF16String& out);
 
-// The line ending that multi-line text is split at.
-const velkcore::UTF16String& GetLineEnding();
+// Multi-line text is split at the core's platform line ending.
+using velkcore::GetLineEnding;
 
 }  // namespace velkui::pictel
