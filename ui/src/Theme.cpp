@@ -1,5 +1,7 @@
 #include <velkui/ui/Theme.h>
 
+#include <velkui/pictel/Gradients.h>
+
 #include <algorithm>
 #include <cmath>
 
@@ -65,6 +67,10 @@ void Theme::Initialize(std::unique_ptr<Theme> theme) {
   velkcore::RequireInput(installed.theme == nullptr);
   theme->changeCount_ = std::max(theme->changeCount_, installed.highestRetiredCount + 1);
   installed.theme = std::move(theme);
+  // Gradients that fall back to one colour take the installed theme's brightness.
+  utils::SetGradientBrightnessFunction([] {
+    return IsInitialized() ? Get().GetBrightness() : GetDefaultBrightness();
+  });
 }
 
 Theme& Theme::Get() {
