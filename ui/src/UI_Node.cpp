@@ -37,6 +37,7 @@ UI_Node::UI_Node() : UI_NodeBase(this) {
 
 UI_Node::~UI_Node() {
   dying_ = true;
+  UI_RemoveAllTimers();
   if (UI_NodeManager* manager = UI_NodeManager::Get(false)) manager->NodeDestroyed(*this);
   DeleteChildren();
 }

@@ -8,6 +8,7 @@
 #include <velkui/ui/NodeManagerGuards.h>
 #include <velkui/ui/UI_ModKeyNotifier.h>
 #include <velkui/ui/UI_Node.h>
+#include <velkui/utility/LibraryResources.h>
 
 #include "ManagerInternals.h"
 #include "NodeHold.h"
@@ -277,7 +278,18 @@ void UI_NodeManager::ToolTipChanged(UI_Node&) {}
 
 void UI_NodeManager::SuspendToolTips(bool) {}
 
-void UI_NodeManager::RemoveNodeTimers(UI_Node&) {}
+void UI_NodeManager::RemoveNodeTimers(UI_Node& node) {
+  node.UI_RemoveAllTimers();
+}
+
+UI_ToolTipManager* UI_NodeManager::GetToolTipManager() {
+  return nullptr;
+}
+
+utility::PictelImageResourceCache::ImagePtr UI_NodeManager::GetImage(
+    const pictel::SupplierInterface& supplier, std::string_view name, pictel::ImageFileType type) {
+  return imageCache_.GetImage(utility::LibraryResources(), supplier, name, type);
+}
 
 // ---- Lifecycle of nodes ----
 

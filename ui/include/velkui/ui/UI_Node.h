@@ -16,6 +16,7 @@
 #include <velkui/ui/LayoutBridgeTypes.h>
 #include <velkui/ui/NodeTypes.h>
 #include <velkui/ui/UI_NodeBase.h>
+#include <velkui/ui/UI_NodeTimerData.h>
 
 namespace velkui::ui {
 
@@ -260,6 +261,23 @@ class UI_Node : public UI_NodeBase {
 
   // ---- Timers and tooltips ----
   const velkcore::UTF16String& UI_GetStoredToolTip() const { return toolTip_; }
+  // Removes this node's timer with `id` (if any), then asks the hosting
+  // window's timer manager for a new one ticking every `seconds`. A node in no
+  // window (no timer manager) raises the input-contract violation.
+  void UI_InstallTimer(float seconds, std::int32_t id);
+  // True when a live timer with `id` was removed.
+  bool UI_RemoveTimer(std::int32_t id);
+  void UI_RemoveAllTimers();
+  bool UI_HasTimer(std::int32_t id) const;
+  // The node's own timers (the timer managers maintain it).
+  UI_NodeTimerList& UI_GetTimerList() { return timers_; }
+  // The node that shows the tooltip while this node is the mouse-over leaf:
+  // this node, or the topmost ancestor of an unbroken chain of ancestors that
+  // each display tooltips for the child below them (UI_DisplaysToolTipForChild).
+  UI_Node* UI_GetToolTipForDisplay();
+  // Shows (or, with `now` false, schedules) the tooltip for this mouse-over
+  // leaf; false when there is none to show, after disposing of the displayed one.
+  bool UI_DisplayToolTip(bool now);
 
  protected:
   UI_Node();
@@ -299,6 +317,7 @@ class UI_Node : public UI_NodeBase {
   std::shared_ptr<CustomKeyboardEventFunction> customKeyboard_;
   std::shared_ptr<FocusChangedFunction> focusChanged_;
   std::unique_ptr<velkcore::SharedFunctions<bool(std::int32_t)>> timerNotify_;
+  UI_NodeTimerList timers_;
   ClientOSEventFunc clientOSEventFunc_ = nullptr;
   mutable boost::intrusive_ptr<pictel::CacheInterface> cache_;
   std::uint64_t cacheSeed_ = 0;

@@ -4,6 +4,7 @@
 #include <functional>
 #include <memory>
 #include <optional>
+#include <string_view>
 #include <utility>
 #include <vector>
 
@@ -18,6 +19,8 @@
 #include <velkui/ui/UI_EventRecorder.h>
 
 namespace velkui::ui {
+
+class UI_ToolTipManager;
 
 // The process's one router of input: it owns the cached roles of nodes
 // (mouse-over leaf and root, keyboard-focus leaf, previous focus leaf, the
@@ -156,8 +159,15 @@ class UI_NodeManager {
   virtual void ToolTipChanged(UI_Node& node);
   // An input capture starts or ends: no tooltip while it runs. Default: nothing.
   virtual void SuspendToolTips(bool suspend);
-  // Removes the timers of `node` (it moves to another window). Default: nothing.
+  // Removes the timers of `node` (it moves to another window). Default: all
+  // of the node's timers go.
   virtual void RemoveNodeTimers(UI_Node& node);
+  // The process's tooltip manager; null by default (no platform, no tooltips).
+  virtual UI_ToolTipManager* GetToolTipManager();
+  // A decoded image from the library's resources, cached per supplier type.
+  utility::PictelImageResourceCache::ImagePtr GetImage(const pictel::SupplierInterface& supplier,
+                                                       std::string_view name,
+                                                       pictel::ImageFileType type);
 
  protected:
   // The position last routed through the mouse-over root, in its coordinates.
