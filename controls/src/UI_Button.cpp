@@ -100,6 +100,18 @@ ui::UI_Color ChooseFrameColor(const DrawButtonParameters& p) {
   return kOutline;
 }
 
+pictel::ColorRGBA FrameColor(const DrawButtonParameters& p) {
+  const ControlState s = p.GetControlState();
+  const ColorChangeMap* map = p.GetColorChangeMap();
+  const pictel::ColorRGBA frame = detail::ThemeColor(ChooseFrameColor(p), map);
+  // A hovered button's frame leans towards the accent.
+  const bool hoverTint =
+      s.IsSet(kControlStateRollover) &&
+      !s.IsAnySet(kControlStateDisabled | kControlStateFocus | kControlStateDown) &&
+      !p.GetSelectedAppearance() && !p.GetDefaultAppearance();
+  return hoverTint ? detail::Mix(frame, detail::ThemeColor(kFocusRing, map), 0.55f) : frame;
+}
+
 // The body of a button in layers: ring or frame, face gradient, highlight,
 // disabled outline, pressed veil. Answers the rectangle of the face.
 RectT<float> DrawBody(const DrawButtonParameters& p, pictel::Pictel& context) {
@@ -120,8 +132,7 @@ RectT<float> DrawBody(const DrawButtonParameters& p, pictel::Pictel& context) {
     detail::Fill(context, detail::RoundedPath(context, rect, radius + kHaloWidth, semi),
                  detail::WithAlpha(detail::ThemeColor(ring, map), focus ? 0.5f : 0.3f));
   }
-  detail::Fill(context, detail::RoundedPath(context, body, radius, semi),
-               detail::ThemeColor(ChooseFrameColor(p), map));
+  detail::Fill(context, detail::RoundedPath(context, body, radius, semi), FrameColor(p));
 
   const RectT<float> face = detail::Inset(body, stroke, stroke);
   if (face.width <= 0 || face.height <= 0) return face;
@@ -222,6 +233,17 @@ void UI_Button::SetContentOffset(const PointT<float>& offset) {
   if (contentOffset_ == offset) return;
   contentOffset_ = offset;
   InvalidateAll();
+}
+
+void UI_Button::ApplyToggleAppearance(DrawButtonParameters& parameters) const {
+  if (springLoaded_ || value_ != kButtonOn || !GetDownState()) return;
+  // An "on" toggle at rest shows the selected face rather than a pressed one.
+  const ui::UI_NodeManager* manager = ui::UI_NodeManager::GetConst(false);
+  if (manager != nullptr && manager->GetActiveInputCapture() == this) return;
+  ControlState state = parameters.GetControlState();
+  state.Clear(kControlStateDown);
+  parameters.SetControlState(state);
+  parameters.SetSelectedAppearance(true);
 }
 
 PointT<float> UI_Button::GetCurrentContentOffset() const {

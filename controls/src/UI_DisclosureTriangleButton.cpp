@@ -80,10 +80,13 @@ void UI_DisclosureTriangleButton::SetDownState(bool down) {
   const bool open = ShowsOpen();
   if (open == shownOpen_) return;
   shownOpen_ = open;
-  if (twirlDuration_ <= 0) return;
-  twirlStart_ = GetControlTime();
+  // Without a window there is no timer to animate with: the triangle turns at once.
   ui::UI_NodeManager* manager = ui::UI_NodeManager::Get(false);
-  if (manager == nullptr || UI_GetTimerManager(false) == nullptr) return;
+  if (twirlDuration_ <= 0 || manager == nullptr || UI_GetTimerManager(false) == nullptr) {
+    twirlStart_ = -1.0;
+    return;
+  }
+  twirlStart_ = GetControlTime();
   if (twirlTimerId_ == 0) twirlTimerId_ = manager->GetUniqueTimerID();
   UI_InstallTimer(kTwirlFrameInterval, twirlTimerId_);
 }

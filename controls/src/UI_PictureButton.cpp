@@ -136,7 +136,9 @@ bool UI_PictureButton::UI_DoKeyboardEvent(ui::UI_Node* target, const ui::Keyboar
 
 void UI_PictureButton::UI_Draw(pictel::Pictel* context) const {
   DrawButtonParameters parameters(this);
-  parameters.SetDrawContainer(ShouldDrawBody(parameters.GetControlState()));
+  ApplyToggleAppearance(parameters);
+  parameters.SetDrawContainer(ShouldDrawBody(parameters.GetControlState()) ||
+                              parameters.GetSelectedAppearance());
   const PictureFace face(GetImage(*context), scale_);
   parameters.SetDrawButtonFace(&face);
   UI_Button::Draw(parameters, context);

@@ -191,6 +191,7 @@ void UI_PictureTextButton::DrawPicture(pictel::Pictel& context, const velkcore::
 
 void UI_PictureTextButton::UI_Draw(pictel::Pictel* context) const {
   DrawButtonParameters parameters(this);
+  ApplyToggleAppearance(parameters);
   parameters.SetDrawContainer(!borderNever_);
   const Face face(*this);
   parameters.SetDrawButtonFace(&face);

@@ -28,7 +28,7 @@ bool IsReturnOrEnter(const ui::KeyboardEvent& event) {
 // The caption, drawn on the face.
 class UI_TextButton::Face : public DrawButtonFace {
  public:
-  explicit Face(const UI_TextButton& button) : button_(button) {}
+  Face(const UI_TextButton& button, bool selected) : button_(button), selected_(selected) {}
 
   void Draw(ControlState state, const velkcore::RectT<float>& rect,
             const velkcore::PointT<float>& offset, pictel::Pictel* context,
@@ -40,6 +40,8 @@ class UI_TextButton::Face : public DrawButtonFace {
       color = kDisabledLabel;
     } else if (button_.GetDefaultAppearance() && !button_.GetDisplayBorderNever()) {
       color = kDefaultLabel;
+    } else if (selected_) {
+      color = kSelectedLabel;
     }
     const float indent = button_.GetTextIndent();
     velkcore::RectT<float> area{rect.left + offset.x + indent, rect.top + offset.y,
@@ -54,6 +56,7 @@ class UI_TextButton::Face : public DrawButtonFace {
 
  private:
   const UI_TextButton& button_;
+  bool selected_;
 };
 
 UI_TextButton::UI_TextButton() {
@@ -144,8 +147,9 @@ void UI_TextButton::UI_Draw(pictel::Pictel* context) const {
     rect.width = std::max(rect.width - labelWidth, 0.0f);
     parameters.SetRectF(rect);
   }
+  ApplyToggleAppearance(parameters);
   parameters.SetDrawContainer(!displayBorderNever_);
-  const Face face(*this);
+  const Face face(*this, parameters.GetSelectedAppearance());
   parameters.SetDrawButtonFace(&face);
   UI_Button::Draw(parameters, context);
   UI_Button::UI_Draw(context);

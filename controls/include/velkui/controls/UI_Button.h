@@ -121,6 +121,8 @@ class UI_Button : public UI_InteractiveControlView, public UI_ColorChangeSupport
  protected:
   UI_Button();
 
+  // An "on" toggle that is not being pressed is drawn with the selected face.
+  void ApplyToggleAppearance(DrawButtonParameters& parameters) const;
   // Starts tracking a press of the left button.
   void BeginButtonCapture(const ui::MouseEvent& event);
   // The tooltip for `keys` (the default one when none matches).
