@@ -297,7 +297,9 @@ bool UI_Button::UI_DoMouseEvent(ui::UI_Node* target, const ui::MouseEvent& event
   SendHover(event);
   // Every press counts: the second press of a double click is a press too.
   if (event.IsAction(ui::MouseEvent::kButtonDown) && event.IsButton(ui::MouseEvent::kLeftButton)) {
-    if (changeFocusOnClick_) UI_GainKeyboardFocus();
+    // A button that wants no focus leaves it where it is (asking would hand
+    // the focus to an ancestor).
+    if (changeFocusOnClick_ && UI_WantsKeyboardFocus()) UI_GainKeyboardFocus();
     if (springLoaded_) SetDownState(false);
     if (notificationOnMouseDown_) {
       ToggleDownState();
