@@ -62,6 +62,22 @@ inline PointT<std::int32_t> RoundPoint(const PointT<float>& p) {
   return {static_cast<std::int32_t>(std::lround(p.x)), static_cast<std::int32_t>(std::lround(p.y))};
 }
 
+// One axis of a child following its parent's resize by `delta` (centred
+// children keep the middle of `newParentLength`).
+inline void FollowParentResize(float newParentLength, float delta, bool centred,
+                               bool leadingFollows, bool trailingFollows, float* position,
+                               float* length) {
+  if (centred) {
+    *position = std::trunc((newParentLength - *length) * 0.5f);
+    return;
+  }
+  if (leadingFollows) {
+    *position += delta;
+    *length -= delta;
+  }
+  if (trailingFollows) *length += delta;
+}
+
 inline velkcore::MatrixT<float> ToAffine(const ScaleMatrixT<float>& m) {
   return {m.sx, 0.0f, 0.0f, m.sy, m.tx, m.ty};
 }

@@ -115,6 +115,13 @@ UI_NodeTimerData* UI_NodeTimerManager::FindTimerBySerial(std::uint32_t serial) c
   return found != timers_.end() ? found->second.get() : nullptr;
 }
 
+std::vector<UI_NodeTimerData*> UI_NodeTimerManager::GetTimers() const {
+  std::vector<UI_NodeTimerData*> timers;
+  timers.reserve(timers_.size());
+  for (const auto& [serial, data] : timers_) timers.push_back(data.get());
+  return timers;
+}
+
 bool UI_NodeTimerManager::DispatchPossibleTimer(UI_NodeTimerData* data) {
   if (GetTimerData(data) == nullptr) return false;
   const UI_NodeTimerDataP keep(data);

@@ -22,20 +22,6 @@ bool IsFinite(const RectT<float>& r) {
          std::isfinite(r.height);
 }
 
-// One axis of a child following its parent's resize.
-void FollowParent(float newParentLength, float delta, bool centred, bool leadingFollows,
-                  bool trailingFollows, float* position, float* length) {
-  if (centred) {
-    *position = std::trunc((newParentLength - *length) * 0.5f);
-    return;
-  }
-  if (leadingFollows) {
-    *position += delta;
-    *length -= delta;
-  }
-  if (trailingFollows) *length += delta;
-}
-
 }  // namespace
 
 UI_SubView::UI_SubView() {
@@ -106,10 +92,12 @@ void UI_SubView::UI_LayoutChildren(const PointT<float>& oldSize, const PointT<fl
     UI_SubView& view = static_cast<UI_SubView&>(*child);
     RectT<float> frame = view.UI_GetLocalRectF(true);
     const LayoutBinding b = view.layoutBinding_;
-    FollowParent(newSize.x, dx, b.IsSet(kBindCenterHorizontally), b.IsSet(kBindLeftToRight),
-                 b.IsSet(kBindRightToRight), &frame.left, &frame.width);
-    FollowParent(newSize.y, dy, b.IsSet(kBindCenterVertically), b.IsSet(kBindTopToBottom),
-                 b.IsSet(kBindBottomToBottom), &frame.top, &frame.height);
+    detail::FollowParentResize(newSize.x, dx, b.IsSet(kBindCenterHorizontally),
+                               b.IsSet(kBindLeftToRight), b.IsSet(kBindRightToRight), &frame.left,
+                               &frame.width);
+    detail::FollowParentResize(newSize.y, dy, b.IsSet(kBindCenterVertically),
+                               b.IsSet(kBindTopToBottom), b.IsSet(kBindBottomToBottom), &frame.top,
+                               &frame.height);
     view.UI_SetLocalRectF(frame);
   }
 }

@@ -4,6 +4,7 @@
 #include <cstdint>
 #include <functional>
 #include <map>
+#include <vector>
 
 #include <velkui/ui/UI_NodeTimerData.h>
 
@@ -42,6 +43,8 @@ class UI_NodeTimerManager {
   UI_NodeTimerData* GetTimerData(const UI_NodeTimerData* data) const;
   UI_NodeTimerData* FindTimerBySerial(std::uint32_t serial) const;
   std::size_t GetTimerCount() const { return timers_.size(); }
+  // The live timers in the order they were made.
+  std::vector<UI_NodeTimerData*> GetTimers() const;
 
   // One tick of `data`'s timer (UI_DispatchPossibleTimer): ignored unless the
   // timer is live here and its node is the manager node or below it; the
