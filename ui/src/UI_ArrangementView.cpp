@@ -1,0 +1,341 @@
+#include <velkui/ui/UI_ArrangementView.h>
+
+#include <algorithm>
+#include <cmath>
+#include <optional>
+#include <utility>
+
+#include <velkcore/Error.h>
+#include <velkui/arrange/Single.h>
+
+#include "NodeHold.h"
+
+namespace velkui::ui {
+
+using arrange::PointF;
+using arrange::RectF;
+using velkcore::PointT;
+using velkcore::RectT;
+
+namespace {
+
+// What a leaf knows of its node: whether it takes part and how large it is.
+struct NodeState {
+  bool visible = false;
+  PointF size{};
+};
+
+NodeState ReadState(const UI_Node& node) {
+  const RectT<float> frame = node.UI_GetLocalRectF(true);
+  const bool visible =
+      node.UI_IsSubView() ? static_cast<const UI_SubView&>(node).UI_GetViewFlags().IsSet(kViewShown)
+                          : node.UI_IsShown();
+  return {visible, {frame.width, frame.height}};
+}
+
+bool SameSize(const PointF& a, const PointF& b) {
+  return a.x == b.x && a.y == b.y;
+}
+
+// Sizes the engine may measure: finite and not negative.
+float Measurable(float length) {
+  return std::isfinite(length) && length > 0 ? length : 0.0f;
+}
+
+}  // namespace
+
+// The leaf of one child node.
+class UI_ArrangementView::NodeBridge : public arrange::Single {
+ public:
+  NodeBridge(UI_ArrangementView& view, UI_Node& node)
+      : view_(view), node_(node), recorded_(ReadState(node)) {}
+
+  UI_Node& Node() const { return node_; }
+
+  float NaturalWidth() const override {
+    return recorded_.visible ? Measurable(recorded_.size.x) : 0.0f;
+  }
+  float NaturalHeight() const override {
+    return recorded_.visible ? Measurable(recorded_.size.y) : 0.0f;
+  }
+  bool HorizontallyExpandable() const override { return HasBinding(kBindRightToRight); }
+  bool VerticallyExpandable() const override { return HasBinding(kBindBottomToBottom); }
+
+  // Records a size or visibility the node took on its own since it was last recorded (a size
+  // this bridge gave it does not count) and marks the leaf out of date. True when it did.
+  bool RecordChanges() {
+    const NodeState now = ReadState(node_);
+    const bool resized =
+        !SameSize(now.size, recorded_.size) && !(placed_ && SameSize(now.size, *placed_));
+    const bool toggled = now.visible != recorded_.visible;
+    if (!resized && !toggled) return false;
+    if (resized) {
+      recorded_.size = now.size;
+      placed_.reset();
+    }
+    recorded_.visible = now.visible;
+    MarkInvalid();
+    return true;
+  }
+
+  void Place(const RectF& rect) override {
+    // A node changed meanwhile is measured again in the next pass instead.
+    if (RecordChanges()) return;
+    if (!recorded_.visible) return;
+    const PointT<float> origin = view_.EngineToLocal(view_, {rect.left, rect.top});
+    const RectT<float> frame{origin.x, origin.y, ExpandedWidth(rect.width),
+                             ExpandedHeight(rect.height)};
+    placed_ = PointF{frame.width, frame.height};
+    // Last: the node's reaction may remove it from the view, which destroys this bridge.
+    const NodeP keep = detail::Hold(&node_);
+    node_.UI_SetLocalRectF(frame);
+  }
+
+ private:
+  bool HasBinding(std::uint8_t bit) const {
+    return node_.UI_IsSubView() &&
+           static_cast<const UI_SubView&>(node_).UI_GetLayoutBinding().IsSet(bit);
+  }
+
+  UI_ArrangementView& view_;
+  UI_Node& node_;
+  NodeState recorded_;
+  std::optional<PointF> placed_;
+};
+
+// The engine's separator of one gap: hands the frame, in the view's coordinates, to the node
+// drawn there.
+class UI_ArrangementView::SeparatorBridge : public arrange::ISeparator {
+ public:
+  SeparatorBridge(UI_ArrangementView& view, NodeP node, arrange::ISeparator& target)
+      : view_(view), node_(std::move(node)), target_(target) {}
+
+  const NodeP& Node() const { return node_; }
+
+  void SetSeparatorFrame(bool acrossColumn, const RectF& frame) override {
+    const PointT<float> origin = view_.EngineToLocal(view_, {frame.left, frame.top});
+    const NodeP keep = node_;
+    target_.SetSeparatorFrame(acrossColumn, {origin.x, origin.y, frame.width, frame.height});
+  }
+
+ private:
+  UI_ArrangementView& view_;
+  NodeP node_;
+  arrange::ISeparator& target_;
+};
+
+UI_ArrangementView::UI_ArrangementView(arrange::GroupArrangementType type)
+    : DefaultGroup(nullptr, type) {
+  UI_SetLayoutsChildren(true);
+}
+
+UI_ArrangementView::~UI_ArrangementView() {
+  // The leaves and separators go while the group they belong to is still whole.
+  bridges_.clear();
+  for (UI_ArrangementView* nested : nested_) {
+    if (nested->Parent() == this) nested->SetParent(nullptr);
+  }
+  nested_.clear();
+  separators_.clear();
+}
+
+void UI_ArrangementView::SetArrangementType(arrange::GroupArrangementType type) {
+  SetArrangementType(type, Parent());
+}
+
+void UI_ArrangementView::EnableSeparators(bool enable) {
+  if (separatorsEnabled_ == enable) return;
+  separatorsEnabled_ = enable;
+  const NodeP keep = detail::Hold(this);
+  BuildSeparators();
+}
+
+void UI_ArrangementView::UpdateChildSizes() {
+  bool changed = false;
+  for (const auto& bridge : bridges_) changed = bridge->RecordChanges() || changed;
+  if (changed) Invalidate();
+}
+
+// ---- Coordinates ----
+
+UI_ArrangementView* UI_ArrangementView::RootView() {
+  arrange::IArrangeable* top = this;
+  while (top->Parent() != nullptr) top = top->Parent();
+  return dynamic_cast<UI_ArrangementView*>(top);
+}
+
+PointT<float> UI_ArrangementView::EngineToLocal(const UI_Node& target, const PointT<float>& p) {
+  UI_ArrangementView* root = RootView();
+  if (root == nullptr) return target.UI_GlobalToLocalF(p);
+  // Relative to where the root stood when it was last arranged: a tree that has moved since
+  // keeps its layout when it is re-arranged at that rectangle.
+  const RectF& last = root->LastRectangle();
+  const PointT<float> inRoot{p.x - last.left, p.y - last.top};
+  if (&target == root) return inRoot;
+  const velkcore::ScaleMatrixT<float> m = target.UI_GetSelfToSpecificParentMatrix(root);
+  const float sx = std::fabs(m.sx) > 1e-6f ? m.sx : 1.0f;
+  const float sy = std::fabs(m.sy) > 1e-6f ? m.sy : 1.0f;
+  return {(inRoot.x - m.tx) / sx, (inRoot.y - m.ty) / sy};
+}
+
+// ---- Group callbacks ----
+
+void UI_ArrangementView::Position(const PointF& origin) {
+  if (IsRootArrangement()) return;
+  UI_Node* parent = UI_GetParentNode();
+  if (parent == nullptr) return;
+  const PointT<float> local = EngineToLocal(*parent, origin);
+  RectT<float> frame = UI_GetLocalRectF(true);
+  frame.left = local.x;
+  frame.top = local.y;
+  UI_SetLocalRectF(frame);
+}
+
+void UI_ArrangementView::SetDimensions(const PointF& size) {
+  if (IsRootArrangement() || !(size.x >= 0 && size.y >= 0)) return;
+  RectT<float> frame = UI_GetLocalRectF(true);
+  frame.width = size.x;
+  frame.height = size.y;
+  UI_SetLocalRectF(frame);
+}
+
+NodeP UI_ArrangementView::NewSeparatorNode() {
+  return nullptr;
+}
+
+arrange::ISeparator* UI_ArrangementView::BuildSeparator() {
+  if (!separatorsEnabled_) return nullptr;
+  const NodeP node = NewSeparatorNode();
+  if (node == nullptr) return nullptr;
+  auto* target = dynamic_cast<arrange::ISeparator*>(node.get());
+  velkcore::RequireInput(target != nullptr);
+  separators_.push_back(std::make_unique<SeparatorBridge>(*this, node, *target));
+  changingSeparators_ = true;
+  try {
+    ChildPushBack(node);
+  } catch (...) {
+    changingSeparators_ = false;
+    separators_.pop_back();
+    throw;
+  }
+  changingSeparators_ = false;
+  if (node->UI_IsSubView()) static_cast<UI_SubView&>(*node).UI_Show(true);
+  return separators_.back().get();
+}
+
+void UI_ArrangementView::ClearSeparators() {
+  DefaultGroup::ClearSeparators();
+  std::vector<std::unique_ptr<SeparatorBridge>> old;
+  old.swap(separators_);
+  changingSeparators_ = true;
+  for (const auto& separator : old) {
+    if (separator->Node()->UI_GetParentContainer() == this) ChildRemove(separator->Node().get());
+  }
+  changingSeparators_ = false;
+}
+
+bool UI_ArrangementView::IsSeparatorNode(const UI_Node* node) const {
+  return std::any_of(separators_.begin(), separators_.end(),
+                     [node](const auto& s) { return s->Node().get() == node; });
+}
+
+// ---- Children ----
+
+void UI_ArrangementView::RebuildArrangeables() {
+  const NodeP keep = detail::Hold(this);
+  std::vector<arrange::IArrangeable*> arrangeables;
+  std::vector<std::unique_ptr<NodeBridge>> bridges;
+  std::vector<UI_ArrangementView*> nested;
+  for (auto it = ChildBegin(); it != ChildEnd(); ++it) {
+    UI_Node* child = it->get();
+    if (IsSeparatorNode(child)) continue;
+    if (auto* view = dynamic_cast<UI_ArrangementView*>(child)) {
+      nested.push_back(view);
+      arrangeables.push_back(view);
+      continue;
+    }
+    const auto found = std::find_if(bridges_.begin(), bridges_.end(),
+                                    [child](const auto& b) { return b && &b->Node() == child; });
+    if (found != bridges_.end()) {
+      bridges.push_back(std::move(*found));
+    } else {
+      bridges.push_back(std::make_unique<NodeBridge>(*this, *child));
+    }
+    arrangeables.push_back(bridges.back().get());
+  }
+  // Leaves of nodes that left go first (the group forgets them as they are destroyed), and
+  // views no longer nested here become roots of their own.
+  bridges_.clear();
+  bridges_ = std::move(bridges);
+  for (UI_ArrangementView* old : nested_) {
+    if (std::find(nested.begin(), nested.end(), old) == nested.end() && old->Parent() == this) {
+      old->SetParent(nullptr);
+    }
+  }
+  nested_ = std::move(nested);
+  SetChildren(arrangeables);
+}
+
+void UI_ArrangementView::ChildAdded(UI_Node* node) {
+  UI_SubView::ChildAdded(node);
+  if (changingSeparators_) return;
+  RebuildArrangeables();
+}
+
+void UI_ArrangementView::ChildRemoved(UI_Node* node) {
+  UI_SubView::ChildRemoved(node);
+  if (changingSeparators_) return;
+  if (IsSeparatorNode(node)) {
+    // Someone else took a separator away: make them all again, so that the engine keeps no
+    // separator whose node is gone.
+    const NodeP keep = detail::Hold(this);
+    BuildSeparators();
+    return;
+  }
+  RebuildArrangeables();
+  // A view that left becomes a root: it arranges itself where it lands.
+  if (auto* view = dynamic_cast<UI_ArrangementView*>(node)) view->ArrangeAsRootView();
+}
+
+void UI_ArrangementView::ChildOrderChanged() {
+  UI_SubView::ChildOrderChanged();
+  RebuildArrangeables();
+}
+
+// ---- Arranging ----
+
+bool UI_ArrangementView::CanArrangeAsRoot() const {
+  return IsRootArrangement() && UI_GetParentNode() != nullptr && UI_IsShown();
+}
+
+void UI_ArrangementView::ArrangeAsRootView() {
+  lastParentNode_ = UI_GetParentNode();
+  lastShown_ = UI_IsShown();
+  if (!CanArrangeAsRoot()) return;
+  const NodeP keep = detail::Hold(this);
+  const RectT<float> bounds = UI_GetLocalRectF(false);
+  const PointT<float> origin = UI_LocalToGlobalF(PointT<float>{0, 0});
+  Arrange({origin.x, origin.y, bounds.width, bounds.height});
+}
+
+void UI_ArrangementView::UI_LayoutChildren(const PointT<float>& /*oldSize*/,
+                                           const PointT<float>& /*newSize*/) {
+  if (IsRootArrangement()) ArrangeAsRootView();
+}
+
+void UI_ArrangementView::UI_NodeChanged(NodeChange change) {
+  UI_SubView::UI_NodeChanged(change);
+  if (change != NodeChange::kParentChanged && change != NodeChange::kShownChanged) return;
+  // Also sent when an ancestor changes; only this view's own attachment and visibility matter.
+  const UI_Node* parent = UI_GetParentNode();
+  if (parent == lastParentNode_ && UI_IsShown() == lastShown_) return;
+  // A view put into another arrangement view is nested by it right after.
+  if (dynamic_cast<const UI_ArrangementView*>(parent) != nullptr) {
+    lastParentNode_ = parent;
+    lastShown_ = UI_IsShown();
+    return;
+  }
+  if (IsRootArrangement()) ArrangeAsRootView();
+}
+
+}  // namespace velkui::ui
