@@ -39,7 +39,7 @@ UI_Button* ButtonInputCapture::GetButton() const {
 void ButtonInputCapture::Begin() {
   UI_Button& button = *GetButton();
   // Without a window there is no timer to repeat with.
-  if (repeatInterval_ != 0 && button.UI_GetTimerManager(false) != nullptr) {
+  if (repeatInterval_ != 0 && button.UI_GetTimerManager(true) != nullptr) {
     startTime_ = GetControlTime();
     button.UI_InstallTimer(repeatInterval_, timerId_);
     timerInstalled_ = true;

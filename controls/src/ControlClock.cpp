@@ -3,6 +3,7 @@
 #include <utility>
 
 #include <velkcore/HighPrecisionTime.h>
+#include <velkui/ui/Platform.h>
 
 namespace velkui::controls {
 
@@ -21,6 +22,8 @@ void SetControlClock(ControlClock clock) {
 
 double GetControlTime() {
   if (const ControlClock& clock = InstalledClock()) return clock();
+  // The platform's clock drives the node timers (virtual on the headless backend).
+  if (const ui::Platform* platform = ui::GetPlatformIfAny()) return platform->GetTime();
   return velkcore::HighPrecisionTime::TicksToSeconds(velkcore::HighPrecisionTime::GetTickCount());
 }
 

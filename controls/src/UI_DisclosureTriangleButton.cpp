@@ -82,7 +82,7 @@ void UI_DisclosureTriangleButton::SetDownState(bool down) {
   shownOpen_ = open;
   // Without a window there is no timer to animate with: the triangle turns at once.
   ui::UI_NodeManager* manager = ui::UI_NodeManager::Get(false);
-  if (twirlDuration_ <= 0 || manager == nullptr || UI_GetTimerManager(false) == nullptr) {
+  if (twirlDuration_ <= 0 || manager == nullptr || UI_GetTimerManager(true) == nullptr) {
     twirlStart_ = -1.0;
     return;
   }

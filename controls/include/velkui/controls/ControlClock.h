@@ -6,9 +6,10 @@ namespace velkui::controls {
 
 // The clock that timed control behaviour reads (the auto-repeat delay of a
 // held button, the twirl of a disclosure triangle, popup toggling), in
-// seconds. By default a monotonic clock; a backend with a clock of its own
-// (the headless backend's virtual clock) installs it here so that timing
-// follows the timers it drives. An empty function restores the default.
+// seconds: the installed platform's clock (Platform::GetTime, virtual on the
+// headless backend), so that timing follows the node timers; without a
+// platform a monotonic clock. A clock set here takes precedence (tests and
+// hosts with a clock of their own); an empty function removes it.
 using ControlClock = std::function<double()>;
 void SetControlClock(ControlClock clock);
 double GetControlTime();
