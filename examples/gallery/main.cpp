@@ -1,86 +1,47 @@
-// Renders a showcase of the drawing API into a PNG file.
+// Renders the gallery's pages into PNG files, without a display.
 //
 //   gallery [output.png]
+//
+// The drawing showcase goes to output.png (default velkui-gallery.png); every
+// other page to output-<page>.png beside it. Prints the files written.
 #include <cstdlib>
 #include <exception>
 #include <filesystem>
 #include <iostream>
+#include <memory>
 #include <string>
 
-#include <velkui/pictel/PictelHandles.h>
+#include <velkui/pictel/ImageIO.h>
+#include <velkui/ui/HeadlessPlatform.h>
+#include <velkui/ui/PlatformSession.h>
 
-#include "GalleryCanvas.h"
-#include "GallerySections.h"
+#include "GalleryPage.h"
 
 namespace {
 
-using namespace gallery;
-using velkui::pictel::BrushP;
-using velkui::pictel::TextAlignment;
-using velkui::pictel::TextTruncation;
-
-constexpr std::int32_t kWidth = 1240;
-constexpr std::int32_t kHeight = 1000;
-constexpr float kMargin = 24;
-constexpr float kHeader = 76;
-
-void DrawHeader(GalleryCanvas& canvas) {
-  auto& surface = canvas.Surface();
-  const velkui::pictel::LinearShaderP band(canvas.Supplier(), {0, 0}, {kWidth, 0},
-                                           ColorRGBA{0.11f, 0.16f, 0.28f, 1},
-                                           ColorRGBA{0.16f, 0.33f, 0.58f, 1});
-  auto header = canvas.NewPath();
-  header->AddRect(RectT<float>{0, 0, kWidth, kHeader - 12});
-  surface.ShadePath(*band, *header, velkui::pictel::FillType::kWinding);
-  BrushP white(canvas.Supplier(), {1, 1, 1, 1});
-  velkui::pictel::FontP big(canvas.Supplier(), u"DejaVu Sans", u"Bold", 24);
-  surface.DrawString(*white, *big, u"velkui \u00B7 pictel gallery", {kMargin, 42},
-                     TextAlignment::kStart, TextTruncation::kNone, 0);
-  BrushP soft(canvas.Supplier(), {0.78f, 0.85f, 0.95f, 1});
-  surface.DrawString(*soft, *canvas.BodyFont(),
-                     u"Device-independent drawing on the Cairo and Pango backend",
-                     {kWidth - kMargin, 40}, TextAlignment::kEnd, TextTruncation::kNone, 0);
+std::filesystem::path PagePath(const std::filesystem::path& output, const std::string& page) {
+  if (page.empty()) return output;
+  std::filesystem::path path = output;
+  path.replace_filename(output.stem().string() + "-" + page + output.extension().string());
+  return path;
 }
 
 }  // namespace
 
 int main(int argc, char** argv) {
-  const std::string output = argc > 1 ? argv[1] : "velkui-gallery.png";
+  const std::filesystem::path output = argc > 1 ? argv[1] : "velkui-gallery.png";
   try {
-    GalleryCanvas canvas(kWidth, kHeight);
-    canvas.Surface().PaintRect({0.93f, 0.94f, 0.96f, 1}, {0, 0, kWidth, kHeight});
-    DrawHeader(canvas);
-
-    using Section = void (*)(GalleryCanvas&, const RectT<float>&);
-    struct Card {
-      const char16_t* title;
-      Section draw;
-    };
-    const Card cards[6] = {
-        {u"Shapes and fills", DrawShapes},
-        {u"Strokes: caps, joins, dashes", DrawStrokes},
-        {u"Gradients and colour", DrawGradientsAndColour},
-        {u"Text: alignment, truncation, underline", DrawTypography},
-        {u"Images: decoding, scaling, opacity", DrawImages},
-        {u"Pixel layouts of caller buffers", DrawPixelLayouts},
-    };
-    const float cardWidth = (kWidth - 4 * kMargin) / 3;
-    const float cardHeight = (kHeight - kHeader - 3 * kMargin) / 2;
-    for (int i = 0; i < 6; ++i) {
-      const RectT<float> frame{
-          kMargin + static_cast<float>(i % 3) * (cardWidth + kMargin),
-          kHeader + kMargin / 2 + static_cast<float>(i / 3) * (cardHeight + kMargin), cardWidth,
-          cardHeight};
-      const RectT<float> area = canvas.Card(frame, cards[i].title);
-      canvas.Surface().PushStateStack();
-      cards[i].draw(canvas, area);
-      canvas.Surface().PopStateStack();
+    // The gallery draws offscreen whatever the display: always headless.
+    velkui::ui::PlatformSession session(std::make_unique<velkui::ui::HeadlessPlatform>());
+    for (const gallery::GalleryPage& page : gallery::RegisteredPages()) {
+      const auto image = page.render();
+      const std::filesystem::path file = PagePath(output, page.name);
+      velkui::pictel::WriteImageToPNGFile(*image, file);
+      std::cout << std::filesystem::absolute(file).string() << '\n';
     }
-    canvas.Save(output);
   } catch (const std::exception& e) {
     std::cerr << "gallery: " << e.what() << '\n';
     return EXIT_FAILURE;
   }
-  std::cout << std::filesystem::absolute(output).string() << '\n';
   return EXIT_SUCCESS;
 }

@@ -232,12 +232,19 @@ void OS_Window::UI_AttachOSWindow(PlatformWindow window) {
   const NodeP keep = detail::Hold(this);
   handle_ = window;
   Register();
+  // A visible window adopted shows the node; a node shown before it had its
+  // window shows the window.
   const bool wasShown = shown_;
-  shown_ = platform.IsWindowVisible(window);
+  shown_ = shown_ || platform.IsWindowVisible(window);
   if (!IsEmbedded()) ReadClientRect();
   RefreshClickMetrics();
   StartPlatformTimers();
   UI_GeometryChanged();
+  if (IsEmbedded()) {
+    SyncEmbeddedGeometry();
+  } else {
+    SyncPlatformVisibility();
+  }
   if (wasShown != shown_) UI_DispatchNodeChange(NodeChange::kShownChanged);
   SynchronizeEmbeddedDescendants(*this);
 }
@@ -411,6 +418,8 @@ void OS_Window::UI_SetLocalRectF(const RectT<float>& rect) {
     UI_DispatchNodeChange(NodeChange::kFrameChanged);
     return;
   }
+  // Kept as the frame for when the window becomes a child node.
+  frame_ = rect;
   const RectT<std::int32_t> wanted = detail::RoundOut(rect);
   if (handle_ == kNoPlatformWindow) {
     const RectT<std::int32_t> before = client_;
