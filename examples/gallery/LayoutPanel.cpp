@@ -109,6 +109,7 @@ LayoutPanel::LayoutPanel(float width, float height) {
   content_->UI_Show(true);
 
   cards_ = MakeGroup(GroupArrangementType::Flipping, 10, 8);
+  cards_->EnableSeparators(true);
   for (const ColorRGBA& color : kCardColors) {
     cards_->ChildPushBack(velkcore::MakeIntrusive<Tile>(150.0f, 64.0f, color));
   }

@@ -7,8 +7,9 @@
 namespace gallery {
 
 // A resizable panel that shows arrangement views reflowing: three cards in a flipping view (a
-// row when the panel is wide, a column when it is narrow) and a strip of tool tiles in a
-// horizontally wrapping view, stacked in a column.
+// row when the panel is wide, a column when it is narrow), with dividers between them, and a
+// strip of tool tiles in a horizontally wrapping view, stacked in a column. The dividers draw
+// with the theme's colours: the theme must be installed before the panel is drawn.
 //
 // The panel's root follows its parent's size through its edge bindings (right and bottom), so
 // a window whose root node lays out its children only has to hold it; Resize sets its size

@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 
 #include <velkui/arrange/ISeparator.h>
+#include <velkui/controls/UI_StaticText.h>
 #include <velkui/ui/UI_ArrangementView.h>
 
 #include "LayoutTestSupport.h"
@@ -297,6 +298,22 @@ TEST_F(ArrangementViewTest, SeparatorsOfAColumnLieAcross) {
   ASSERT_NE(separator, nullptr);
   EXPECT_TRUE(separator->across);
   EXPECT_RECT(separator->UI_GetLocalRectF(true), 0, 20, 30, 2);
+}
+
+TEST_F(ArrangementViewTest, SeparatorsAreDividersByDefault) {
+  auto view = MakeView(GroupArrangementType::Row);
+  view->SetHorizontalSpacing(4);
+  view->EnableSeparators(true);
+  EXPECT_TRUE(view->HasSeparators());
+  AddFixed(view.get(), {0, 0, 50, 20});
+  AddFixed(view.get(), {0, 0, 30, 20});
+  Attach(view);
+  ASSERT_EQ(view->ChildSize(), 3u);
+  auto* divider = dynamic_cast<controls::UI_Divider*>(view->ChildGet(2).get());
+  ASSERT_NE(divider, nullptr);
+  EXPECT_TRUE(divider->UI_IsShown());
+  EXPECT_TRUE(divider->IsVertical());
+  EXPECT_RECT(divider->UI_GetLocalRectF(true), 50, 0, 4, 20);
 }
 
 TEST_F(ArrangementViewTest, ASeparatorNodeMustBeASeparator) {

@@ -5,12 +5,21 @@
 #include <velkui/pictel/SupplierInterface.h>
 #include <velkui/pictel/SurfaceInterface.h>
 #include <velkui/test/GoldenImage.h>
+#include <velkui/ui/Theme.h>
 
 #include "LayoutPanel.h"
 #include "LayoutTestSupport.h"
 
 namespace velkui::layout::test {
 namespace {
+
+// The dividers draw with the theme's colours.
+struct ScopedTheme {
+  ScopedTheme() { ui::Theme::Initialize(std::make_unique<ui::Theme>()); }
+  ~ScopedTheme() { ui::Theme::Terminate(); }
+  ScopedTheme(const ScopedTheme&) = delete;
+  ScopedTheme& operator=(const ScopedTheme&) = delete;
+};
 
 ::testing::AssertionResult RendersAsGolden(gallery::LayoutPanel& panel, std::int32_t width,
                                            std::int32_t height, const std::string& name) {
@@ -25,6 +34,7 @@ namespace {
 // The same panel, made wide and then narrow: the cards flip from a row to a column and the
 // tools wrap onto more lines.
 TEST(LayoutPanelGoldenTest, ReflowsWhenResized) {
+  const ScopedTheme theme;
   gallery::LayoutPanel panel(600, 240);
   EXPECT_TRUE(RendersAsGolden(panel, 600, 240, "layout_panel_wide"));
   const RectT<float> cardsWide = panel.Cards()->UI_GetLocalRectF(true);

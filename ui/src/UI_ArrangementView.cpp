@@ -7,6 +7,7 @@
 
 #include <velkcore/Error.h>
 #include <velkui/arrange/Single.h>
+#include <velkui/controls/UI_StaticText.h>
 
 #include "NodeHold.h"
 
@@ -41,6 +42,15 @@ bool SameSize(const PointF& a, const PointF& b) {
 float Measurable(float length) {
   return std::isfinite(length) && length > 0 ? length : 0.0f;
 }
+
+// The divider drawn in a gap between two children: it takes the frame the engine gives it
+// (already in the view's coordinates).
+class GapDivider : public controls::UI_Divider, public arrange::ISeparator {
+ public:
+  void SetSeparatorFrame(bool /*acrossColumn*/, const RectF& frame) override {
+    UI_SetLocalRectF(frame);
+  }
+};
 
 }  // namespace
 
@@ -200,7 +210,7 @@ void UI_ArrangementView::SetDimensions(const PointF& size) {
 }
 
 NodeP UI_ArrangementView::NewSeparatorNode() {
-  return nullptr;
+  return velkcore::MakeIntrusive<GapDivider>();
 }
 
 arrange::ISeparator* UI_ArrangementView::BuildSeparator() {

@@ -71,9 +71,10 @@ class UI_ArrangementView : public UI_SubView, public arrange::DefaultGroup<arran
   // Arranges when this view is the root arrangement; never applies edge bindings.
   void UI_LayoutChildren(const velkcore::PointT<float>& oldSize,
                          const velkcore::PointT<float>& newSize) override;
-  // Makes the node drawn between two children. It must implement arrange::ISeparator, whose
-  // SetSeparatorFrame receives the frame in this view's coordinates (a zero size when the gap
-  // is not in use). Returning null leaves that gap without a separator.
+  // Makes the node drawn between two children: by default a divider control
+  // (controls::UI_Divider). It must implement arrange::ISeparator, whose SetSeparatorFrame
+  // receives the frame in this view's coordinates (a zero size when the gap is not in use).
+  // Returning null leaves that gap without a separator.
   virtual NodeP NewSeparatorNode();
 
  private:
