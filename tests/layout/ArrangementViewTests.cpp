@@ -219,6 +219,10 @@ TEST_F(ArrangementViewTest, BindingsMakeChildrenExpandableAndTheirNaturalSizeSta
   view->UI_SetLocalRectF({10, 20, 150, 60});
   EXPECT_RECT(a->UI_GetLocalRectF(true), 0, 0, 120, 60);
   EXPECT_RECT(b->UI_GetLocalRectF(true), 120, 0, 30, 20);
+  // A binding changed later is noticed too.
+  b->UI_SetLayoutBinding(ui::kBindBottomToBottom);
+  view->UpdateChildSizes();
+  EXPECT_RECT(b->UI_GetLocalRectF(true), 120, 0, 30, 60);
 }
 
 TEST_F(ArrangementViewTest, AChildRemovingItselfWhilePlacedIsSafe) {
@@ -284,6 +288,20 @@ TEST_F(ArrangementViewTest, SeparatorsFillTheGapsInTheViewsCoordinates) {
   EXPECT_EQ(view->GetSeparatorNodeCount(), 0u);
   EXPECT_EQ(view->ChildSize(), 4u);
   EXPECT_RECT(c->UI_GetLocalRectF(true), 92, 0, 30, 10);
+}
+
+TEST_F(ArrangementViewTest, DeletingAllChildrenLeavesNoSeparatorBehind) {
+  for (const bool arranged : {true, false}) {
+    auto view = MakeView<SeparatedView>(GroupArrangementType::Row);
+    view->EnableSeparators(true);
+    for (int i = 0; i < 3; ++i) AddFixed(view.get(), {0, 0, 10, 10});
+    if (arranged) Attach(view);
+    view->BuildSeparators();
+    ASSERT_EQ(view->ChildSize(), 5u);
+    view->DeleteChildren();
+    EXPECT_EQ(view->ChildSize(), 0u) << (arranged ? "arranged" : "never arranged");
+    EXPECT_EQ(view->GetSeparatorNodeCount(), 0u);
+  }
 }
 
 TEST_F(ArrangementViewTest, SeparatorsOfAColumnLieAcross) {

@@ -113,14 +113,6 @@ TEST(SpacerTest, BadSizesAndNullObjectsAreRefused) {
   EXPECT_CONTRACT_VIOLATION(spacer.SetLocation({0, 0, std::nanf(""), 1}));
 }
 
-TEST(PlacementTest, CombinedSizesTakeTheFirstOperandOnTies) {
-  const auto& left = *LayoutPlacement_LeftOfDO::GetSharedPtr();
-  const auto& above = *LayoutPlacement_AboveDO::GetSharedPtr();
-  EXPECT_EQ(left.GetCombinedSize({10, 30}, {20, 5}), (PointT<float>{30, 30}));
-  EXPECT_EQ(above.GetCombinedSize({10, 30}, {20, 5}), (PointT<float>{20, 35}));
-  EXPECT_EQ(&LayoutPlacement_LeftOfDO::GetSharedPtr(), &LayoutPlacement_LeftOfDO::GetSharedPtr());
-}
-
 TEST(PlacementTest, ANullExtraSpaceRuleIsRefused) {
   RectT<float> own{};
   RectT<float> decorated{};

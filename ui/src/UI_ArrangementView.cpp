@@ -20,18 +20,23 @@ using velkcore::RectT;
 
 namespace {
 
-// What a leaf knows of its node: whether it takes part and how large it is.
+// The bindings that make a leaf expandable.
+constexpr std::uint8_t kExpandingBindings = kBindRightToRight | kBindBottomToBottom;
+
+// What a leaf knows of its node: whether it takes part, how large it is and how it may grow.
 struct NodeState {
   bool visible = false;
   PointF size{};
+  std::uint8_t growth = 0;
 };
 
 NodeState ReadState(const UI_Node& node) {
   const RectT<float> frame = node.UI_GetLocalRectF(true);
-  const bool visible =
-      node.UI_IsSubView() ? static_cast<const UI_SubView&>(node).UI_GetViewFlags().IsSet(kViewShown)
-                          : node.UI_IsShown();
-  return {visible, {frame.width, frame.height}};
+  if (!node.UI_IsSubView()) return {node.UI_IsShown(), {frame.width, frame.height}, 0};
+  const auto& view = static_cast<const UI_SubView&>(node);
+  return {view.UI_GetViewFlags().IsSet(kViewShown),
+          {frame.width, frame.height},
+          static_cast<std::uint8_t>(view.UI_GetLayoutBinding().Get() & kExpandingBindings)};
 }
 
 bool SameSize(const PointF& a, const PointF& b) {
@@ -68,22 +73,29 @@ class UI_ArrangementView::NodeBridge : public arrange::Single {
   float NaturalHeight() const override {
     return recorded_.visible ? Measurable(recorded_.size.y) : 0.0f;
   }
-  bool HorizontallyExpandable() const override { return HasBinding(kBindRightToRight); }
-  bool VerticallyExpandable() const override { return HasBinding(kBindBottomToBottom); }
+  bool HorizontallyExpandable() const override {
+    return (recorded_.growth & kBindRightToRight) != 0;
+  }
+  bool VerticallyExpandable() const override {
+    return (recorded_.growth & kBindBottomToBottom) != 0;
+  }
 
-  // Records a size or visibility the node took on its own since it was last recorded (a size
-  // this bridge gave it does not count) and marks the leaf out of date. True when it did.
+  // Records a size, visibility or binding the node took on its own since it was last recorded
+  // (a size this bridge gave it does not count) and marks the leaf out of date. True when it
+  // did.
   bool RecordChanges() {
     const NodeState now = ReadState(node_);
     const bool resized =
         !SameSize(now.size, recorded_.size) && !(placed_ && SameSize(now.size, *placed_));
-    const bool toggled = now.visible != recorded_.visible;
-    if (!resized && !toggled) return false;
+    if (!resized && now.visible == recorded_.visible && now.growth == recorded_.growth) {
+      return false;
+    }
     if (resized) {
       recorded_.size = now.size;
       placed_.reset();
     }
     recorded_.visible = now.visible;
+    recorded_.growth = now.growth;
     MarkInvalid();
     return true;
   }
@@ -102,11 +114,6 @@ class UI_ArrangementView::NodeBridge : public arrange::Single {
   }
 
  private:
-  bool HasBinding(std::uint8_t bit) const {
-    return node_.UI_IsSubView() &&
-           static_cast<const UI_SubView&>(node_).UI_GetLayoutBinding().IsSet(bit);
-  }
-
   UI_ArrangementView& view_;
   UI_Node& node_;
   NodeState recorded_;
@@ -296,10 +303,11 @@ void UI_ArrangementView::ChildRemoved(UI_Node* node) {
   UI_SubView::ChildRemoved(node);
   if (changingSeparators_) return;
   if (IsSeparatorNode(node)) {
-    // Someone else took a separator away: make them all again, so that the engine keeps no
-    // separator whose node is gone.
+    // Someone else took a separator away: drop them all, so that the engine keeps no separator
+    // whose node is gone; the next arrangement makes them again.
     const NodeP keep = detail::Hold(this);
-    BuildSeparators();
+    ClearSeparators();
+    Invalidate();
     return;
   }
   RebuildArrangeables();

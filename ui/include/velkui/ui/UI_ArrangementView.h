@@ -26,8 +26,9 @@ namespace velkui::ui {
 // window's client area, in the view's own units); every node is placed in its own parent's
 // coordinates. A nested view's origin and size are set from what the engine reports.
 //
-// A child that changes size or visibility on its own is noticed when it is next placed, which
-// then runs another pass with its new size; UpdateChildSizes notices it at once.
+// A child that changes size, visibility or binding on its own is noticed when it is next
+// placed, which then runs another pass with what it has become; UpdateChildSizes notices it
+// at once.
 class UI_ArrangementView : public UI_SubView, public arrange::DefaultGroup<arrange::DynamicGroup> {
  public:
   explicit UI_ArrangementView(
@@ -42,7 +43,7 @@ class UI_ArrangementView : public UI_SubView, public arrange::DefaultGroup<arran
   void EnableSeparators(bool enable);
   bool HasSeparators() const { return separatorsEnabled_; }
 
-  // Re-reads every child's size and visibility and re-arranges when one changed.
+  // Re-reads every child's size, visibility and binding and re-arranges when one changed.
   void UpdateChildSizes();
 
   bool IsRootArrangement() const { return Parent() == nullptr; }
