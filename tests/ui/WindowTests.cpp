@@ -53,6 +53,25 @@ TEST_F(WindowLifecycleTest, AUserResizeReachesTheTreeAndBoundChildrenFollow) {
   EXPECT_EQ(headless.GetPaintCount(Handle(*window)), 2);
 }
 
+TEST_F(WindowLifecycleTest, NodesResizedDuringAUserResizeRepaintWhenItEnds) {
+  auto window = MakeWindow({0, 0, 200, 100});
+  auto view = View(window.get(), {10, 10, 30, 30}, "view");
+  headless.ProcessEvents();
+  UI_NodeManager& manager = session.GetNodeManager();
+  manager.BeginUserResizing(window.get(), false);
+  manager.BeginUserResizing(window.get(), false);
+  manager.InvalidateNodeAfterUserResize(view.get());
+  manager.InvalidateNodeAfterUserResize(view.get());
+  manager.EndUserResizing(window.get(), false);
+  EXPECT_FALSE(headless.HasPendingPaint(Handle(*window)));
+  manager.EndUserResizing(window.get(), false);
+  EXPECT_EQ(headless.GetPendingPaintBounds(Handle(*window)), (RectT<std::int32_t>{10, 10, 30, 30}));
+  headless.ProcessEvents();
+  // Outside a user resize the repaint is asked for at once.
+  manager.InvalidateNodeAfterUserResize(view.get());
+  EXPECT_TRUE(headless.HasPendingPaint(Handle(*window)));
+}
+
 TEST_F(WindowLifecycleTest, WindowsAreFoundByHandleAndByNodeID) {
   auto a = MakeWindow({0, 0, 10, 10});
   auto b = MakeWindow({20, 0, 10, 10});

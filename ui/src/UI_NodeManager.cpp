@@ -250,6 +250,27 @@ void UI_NodeManager::BeginUserResizing(UI_Node* node, bool live) {
 void UI_NodeManager::EndUserResizing(UI_Node* node, bool live) {
   if (userResizing_ > 0) --userResizing_;
   userResize_.Call(false, node, live);
+  if (userResizing_ == 0) InvalidateResizedNodes();
+}
+
+void UI_NodeManager::InvalidateNodeAfterUserResize(UI_Node* node) {
+  velkcore::RequireInput(node != nullptr);
+  if (!IsUserResizing()) {
+    const NodeP keep = detail::Hold(node);
+    node->UI_Invalidate(nullptr, InvalidateFlags{});
+    return;
+  }
+  if (std::find(resizedNodes_.begin(), resizedNodes_.end(), node) == resizedNodes_.end()) {
+    resizedNodes_.push_back(detail::Hold(node));
+  }
+}
+
+void UI_NodeManager::InvalidateResizedNodes() {
+  const std::vector<NodeP> nodes = std::move(resizedNodes_);
+  resizedNodes_.clear();
+  for (const NodeP& node : nodes) {
+    if (node) node->UI_Invalidate(nullptr, InvalidateFlags{});
+  }
 }
 
 void UI_NodeManager::NotifyUserResize(UI_Node* node, bool) {

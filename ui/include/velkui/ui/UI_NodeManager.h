@@ -140,6 +140,11 @@ class UI_NodeManager {
   void EndUserResizing(UI_Node* node, bool live);
   // One resize step of `node` during a user resize.
   void NotifyUserResize(UI_Node* node, bool live);
+  // A node the user resized: repainted at once, or, while a user resize is
+  // under way, once the last EndUserResizing comes.
+  void InvalidateNodeAfterUserResize(UI_Node* node);
+  // Repaints the nodes recorded during the user resize and forgets them.
+  void InvalidateResizedNodes();
 
   // ---- Platform and service hooks (OS_NodeManager and later subsystems fill them) ----
   // Where the pointer is now in `root`'s coordinates. The default answers the
@@ -251,6 +256,7 @@ class UI_NodeManager {
   std::vector<const OS_Window*> suspendedMouseActivates_;
   bool frontmost_ = true;
   std::int32_t userResizing_ = 0;
+  std::vector<NodeP> resizedNodes_;
   utility::PictelImageResourceCache imageCache_;
   CustomSettingsManager customSettings_;
   std::uint64_t pictelCacheSeed_ = 1;
