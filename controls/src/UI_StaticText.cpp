@@ -4,7 +4,6 @@
 #include <cmath>
 
 #include <velkcore/Error.h>
-#include <velkui/controls/ControlClock.h>
 #include <velkui/pictel/PathShapes.h>
 #include <velkui/pictel/SurfaceInterface.h>
 
@@ -16,7 +15,6 @@ namespace {
 
 constexpr ui::UI_Color kStaticText = 179;
 constexpr ui::UI_Color kDisabledStaticText = 180;
-constexpr ui::UI_Color kSeparator = 8;
 constexpr float kDefaultWrapWidth = 200.0f;
 
 }  // namespace
@@ -106,47 +104,6 @@ velkcore::PointT<float> UI_StaticText::UI_GetRecommendedSize(pictel::Pictel* con
                                      : context->GetSurface()->MeasureMultiLineStringHeight(
                                            *font, text_.c_str(), width, -1);
   return {width, std::ceil(std::max(height, lineHeight))};
-}
-
-// ---- UI_Divider ----
-
-UI_Divider::UI_Divider() {
-  UI_SetNodeID("UI_Divider");
-}
-
-UI_Divider::~UI_Divider() = default;
-
-bool UI_Divider::IsVertical() const {
-  const velkcore::RectT<float> r = UI_GetLocalRectF(false);
-  return r.height > r.width;
-}
-
-void UI_Divider::UI_Draw(pictel::Pictel* context) const {
-  const velkcore::RectT<float> r = UI_GetLocalRectF(false);
-  const pictel::ColorRGBA color = detail::ThemeColor(kSeparator, nullptr);
-  if (IsVertical()) {
-    context->GetSurface()->PaintRect(
-        color, {std::floor(r.left + r.width / 2 - 0.5f), r.top, 1.0f, r.height});
-  } else {
-    context->GetSurface()->PaintRect(
-        color, {r.left, std::floor(r.top + r.height / 2 - 0.5f), r.width, 1.0f});
-  }
-  UI_ControlView::UI_Draw(context);
-}
-
-velkcore::PointT<float> UI_Divider::UI_GetRecommendedSize(pictel::Pictel*) {
-  return IsVertical() ? velkcore::PointT<float>{2, 120} : velkcore::PointT<float>{120, 2};
-}
-
-// ---- PopupToggler ----
-
-bool PopupToggler::DoPopup() const {
-  return !valid_ || GetControlTime() - closedAt_ > kReopenDelay;
-}
-
-void PopupToggler::EndPopup() {
-  closedAt_ = GetControlTime();
-  valid_ = true;
 }
 
 }  // namespace velkui::controls

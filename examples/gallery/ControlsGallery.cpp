@@ -7,9 +7,10 @@
 #include <velkui/controls/ControlPalettes.h>
 #include <velkui/controls/UI_Checkbox.h>
 #include <velkui/controls/UI_DisclosureTriangleButton.h>
+#include <velkui/controls/UI_OwnerDrawButton.h>
 #include <velkui/controls/UI_PictureButton.h>
 #include <velkui/controls/UI_PictureTextButton.h>
-#include <velkui/controls/UI_RadioButton.h>
+#include <velkui/controls/UI_RadioGroup.h>
 #include <velkui/controls/UI_StaticText.h>
 #include <velkui/controls/UI_TextButton.h>
 #include <velkui/pictel/PathShapes.h>

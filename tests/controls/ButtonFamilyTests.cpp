@@ -3,8 +3,9 @@
 #include <velkcore/Error.h>
 #include <velkui/controls/UI_Checkbox.h>
 #include <velkui/controls/UI_DisclosureTriangleButton.h>
+#include <velkui/controls/UI_OwnerDrawButton.h>
 #include <velkui/controls/UI_PictureButton.h>
-#include <velkui/controls/UI_RadioButton.h>
+#include <velkui/controls/UI_RadioGroup.h>
 #include <velkui/controls/UI_TextButton.h>
 #include <velkui/pictel/OSSupplier.h>
 #include <velkui/ui/UI_ModKeyNotifier.h>

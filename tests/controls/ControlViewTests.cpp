@@ -2,12 +2,14 @@
 
 #include <velkcore/Error.h>
 #include <velkui/controls/ControlAlignment.h>
+#include <velkui/controls/PopupToggler.h>
 #include <velkui/controls/UI_Checkbox.h>
 #include <velkui/controls/UI_ContainerControlView.h>
 #include <velkui/controls/UI_DisclosureTriangleButton.h>
+#include <velkui/controls/UI_OwnerDrawButton.h>
 #include <velkui/controls/UI_PictureButton.h>
 #include <velkui/controls/UI_PictureTextButton.h>
-#include <velkui/controls/UI_RadioButton.h>
+#include <velkui/controls/UI_RadioGroup.h>
 #include <velkui/controls/UI_StaticText.h>
 #include <velkui/controls/UI_TextButton.h>
 

@@ -3,6 +3,7 @@
 #include <cstdint>
 
 #include <velkui/controls/DrawButtonFace.h>
+#include <velkui/controls/UI_OwnerDrawButton.h>
 #include <velkui/controls/UI_PictureTextButton.h>
 
 namespace velkui::controls {
@@ -64,25 +65,6 @@ class UI_DisclosureTriangleButton : public UI_PictureTextButton {
   bool shownOpen_ = false;
   double twirlStart_ = -1.0;
   std::int32_t twirlTimerId_ = 0;
-};
-
-// A button whose whole drawing is left to the host.
-class UI_OwnerDrawButton : public UI_Button {
- public:
-  using OwnerDrawFunction =
-      std::function<void(const UI_OwnerDrawButton& button, pictel::Pictel* context)>;
-  using OwnerDrawFunctionP = std::shared_ptr<OwnerDrawFunction>;
-
-  UI_OwnerDrawButton();
-  ~UI_OwnerDrawButton() override;
-
-  // Without a function (or with an empty one) the plain button body is drawn.
-  void SetOwnerDrawFunction(const OwnerDrawFunctionP& function);
-  const OwnerDrawFunctionP& GetOwnerDrawFunction() const { return ownerDraw_; }
-  void UI_Draw(pictel::Pictel* context) const override;
-
- private:
-  OwnerDrawFunctionP ownerDraw_;
 };
 
 }  // namespace velkui::controls

@@ -3,6 +3,7 @@
 #include <velkcore/Strings.h>
 #include <velkui/controls/ControlAlignment.h>
 #include <velkui/controls/UI_ControlView.h>
+#include <velkui/controls/UI_Divider.h>
 #include <velkui/controls/UI_TextControlBase.h>
 
 namespace velkui::controls {
@@ -38,32 +39,6 @@ class UI_StaticText : public UI_ControlView, public UI_TextControlBase {
   bool multiLine_ = false;
   ControlAlignment alignment_ = kControlAlignLeft;
   ControlVerticalAlignment verticalAlignment_ = kControlAlignMiddle;
-};
-
-// A separator line across its longer side.
-class UI_Divider : public UI_ControlView {
- public:
-  UI_Divider();
-  ~UI_Divider() override;
-
-  void UI_Draw(pictel::Pictel* context) const override;
-  velkcore::PointT<float> UI_GetRecommendedSize(pictel::Pictel* context) override;
-  bool IsVertical() const;
-};
-
-// Keeps the click that closed a popup from opening it again: a popup control
-// calls EndPopup when its popup closes and opens it only when DoPopup agrees
-// (never set, or more than 0.1 s ago).
-class PopupToggler {
- public:
-  static constexpr double kReopenDelay = 0.1;
-
-  bool DoPopup() const;
-  void EndPopup();
-
- private:
-  double closedAt_ = -1.0;
-  bool valid_ = false;
 };
 
 }  // namespace velkui::controls
