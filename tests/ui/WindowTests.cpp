@@ -320,6 +320,25 @@ TEST_F(WindowLifecycleTest, TimersTickThroughThePlatformAndStopWithTheirWindow) 
   EXPECT_FALSE(view->UI_HasTimer(3));
 }
 
+TEST_F(WindowLifecycleTest, AQueueThatNeverRunsDryIsAnErrorNotAHang) {
+  auto window = MakeWindow({0, 0, 100, 100});
+  auto view = View(window.get(), {0, 0, 10, 10}, "view");
+  // A node that asks for another paint from its own paint.
+  view->onDraw = [](LoggingView& self) { self.UI_Invalidate(nullptr, InvalidateFlags{}); };
+  view->UI_Invalidate(nullptr, InvalidateFlags{});
+  headless.SetMessageLimit(500);
+  try {
+    headless.ProcessEvents();
+    FAIL() << "no error";
+  } catch (const velkcore::Exception& e) {
+    EXPECT_EQ(e.GetNumber(), 22);
+  }
+  view->onDraw = nullptr;
+  headless.ProcessEvents();
+  HeadlessPlatform loose;
+  EXPECT_THROW(loose.ProcessEvents(), velkcore::Exception);
+}
+
 TEST_F(WindowLifecycleTest, TheModalLoopEndsWhenTheHeadlessQueueRunsDryOrOnQuit) {
   auto window = MakeWindow({0, 0, 100, 100});
   MoveTo(*window, 5, 5);

@@ -41,8 +41,12 @@ class HeadlessPlatform : public Platform {
   // one due timer to the next and every message is dispatched on the way.
   void RunFor(double seconds);
   // Dispatches every waiting message (and due timer, and paint) at the
-  // current time. Answers false when a quit request was taken.
+  // current time. Answers false when a quit request was taken. The platform
+  // must be the installed one. A queue that never runs dry (a handler that
+  // keeps posting, a node that invalidates itself while it paints) raises an
+  // error after the message limit (100000 by default) instead of hanging.
   bool ProcessEvents();
+  void SetMessageLimit(std::int64_t limit);
 
   // ---- Native-level input ----
   void MovePointer(const velkcore::PointT<std::int32_t>& screenPoint);

@@ -30,6 +30,9 @@ constexpr std::uint32_t kMinimumTimerInterval = 10;
 constexpr std::int32_t kTitleBarHeight = 24;
 constexpr std::int32_t kBorder = 1;
 constexpr std::int32_t kSizingBorder = 4;
+constexpr std::string_view kEndlessMessagesKey =
+    "$$$/velkui/ui/Error/EndlessMessages=The message queue did not run dry after ^0 messages.";
+constexpr std::int32_t kEndlessMessagesNumber = 22;
 // More separate pending rectangles than this are merged into their bounds.
 constexpr std::size_t kMaxPendingRects = 16;
 
@@ -188,6 +191,7 @@ struct HeadlessPlatform::Impl {
   CursorShape cursor = CursorShape::kArrow;
   bool quitPending = false;
   std::int32_t quitCode = 0;
+  std::int64_t messageLimit = 100000;
 
   WindowRecord* Find(PlatformWindow handle) {
     const auto found = windows.find(handle);
@@ -564,6 +568,11 @@ std::string_view HeadlessPlatform::GetName() const {
 
 // ---- Clock ----
 
+void HeadlessPlatform::SetMessageLimit(std::int64_t limit) {
+  velkcore::RequireInput(limit > 0);
+  impl_->messageLimit = limit;
+}
+
 void HeadlessPlatform::AdvanceTime(double seconds) {
   velkcore::RequireInput(std::isfinite(seconds) && seconds >= 0.0);
   impl_->now += seconds;
@@ -584,7 +593,23 @@ void HeadlessPlatform::RunFor(double seconds) {
 }
 
 bool HeadlessPlatform::ProcessEvents() {
-  return OS_DispatchPendingEvents();
+  // Dispatching goes through the installed platform's pump.
+  velkcore::RequireInput(GetPlatformIfAny() == this);
+  for (std::int64_t turn = 0; turn < impl_->messageLimit; ++turn) {
+    switch (OS_PumpEvent(false)) {
+      case PumpResult::kDispatched:
+        break;
+      case PumpResult::kIdle:
+        return true;
+      case PumpResult::kQuit:
+        return false;
+    }
+  }
+  // A handler that keeps posting (or repainting from its own paint) would
+  // otherwise hang the caller.
+  velkcore::ThrowError(velkcore::ErrorLevel::kError, kEndlessMessagesKey,
+                       velkcore::kCategoryUserInterface, kEndlessMessagesNumber, 0,
+                       impl_->messageLimit);
 }
 
 // ---- Native-level input ----
