@@ -124,3 +124,21 @@ TEST(HighPrecisionTime, MonotonicWithAKnownFrequency) {
   EXPECT_EQ(HighPrecisionTime::GetFrequency(), 1'000'000'000u);
   EXPECT_DOUBLE_EQ(HighPrecisionTime::TicksToSeconds(1'500'000'000u), 1.5);
 }
+
+TEST(SharedFunctions, EmptiedFunctionsAreSkippedAndDroppedOnRequest) {
+  SharedFunctions<void(int)> list;
+  int total = 0;
+  SharedFunctions<void(int)>::FunctionPtr self;
+  // Empties itself while running, the usual way of unsubscribing from inside.
+  self = list.Add([&](int v) {
+    *self = nullptr;
+    total += v;  // still safe: the running function is a copy
+  });
+  auto later = list.Add([&](int v) { total += 10 * v; });
+  *later = nullptr;
+  list.CallSkippingEmpty(1);
+  EXPECT_EQ(total, 1);
+  EXPECT_EQ(list.Size(), 2u);
+  list.DropEmptyFunctions();
+  EXPECT_TRUE(list.Empty());
+}

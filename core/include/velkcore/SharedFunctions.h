@@ -52,14 +52,26 @@ class SharedFunctions<R(Args...)> {
     const auto& fs = state_->functions;
     return std::find(fs.begin(), fs.end(), f) != fs.end();
   }
+  // Drops entries whose function was emptied (how subscribers often unsubscribe).
+  void DropEmptyFunctions() {
+    std::erase_if(state_->functions, [](const FunctionPtr& f) { return !*f; });
+  }
   void Clear() { state_->functions.clear(); }
   std::size_t Size() const { return state_->functions.size(); }
   bool Empty() const { return state_->functions.empty(); }
 
   // Calls every function in order. An empty std::function throws std::bad_function_call.
   void Call(Args... args) const {
-    ForEachLive([&](Function& f) {
+    ForEachLive([&](const Function& f) {
       f(args...);
+      return false;
+    });
+  }
+
+  // Calls every function in order, skipping the ones that were emptied.
+  void CallSkippingEmpty(Args... args) const {
+    ForEachLive([&](const Function& f) {
+      if (f) f(args...);
       return false;
     });
   }
@@ -68,7 +80,7 @@ class SharedFunctions<R(Args...)> {
   bool CallUntilTrue(Args... args) const
     requires std::is_convertible_v<R, bool>
   {
-    return ForEachLive([&](Function& f) { return static_cast<bool>(f(args...)); });
+    return ForEachLive([&](const Function& f) { return static_cast<bool>(f(args...)); });
   }
 
  private:
@@ -84,7 +96,9 @@ class SharedFunctions<R(Args...)> {
     for (const FunctionPtr& f : snapshot) {
       const auto& live = state->functions;
       if (std::find(live.begin(), live.end(), f) == live.end()) continue;
-      if (visit(*f)) return true;
+      // A copy: the callback may empty or replace its own function while it runs.
+      const Function call = *f;
+      if (visit(call)) return true;
     }
     return false;
   }

@@ -1,12 +1,8 @@
 #pragma once
 
-#include <algorithm>
 #include <cstddef>
-#include <functional>
-#include <memory>
-#include <vector>
 
-#include <velkcore/Error.h>
+#include <velkcore/SharedFunctions.h>
 #include <velkui/controls/MessageT.h>
 #include <velkui/ui/NodeTypes.h>
 
@@ -24,59 +20,33 @@ namespace velkui::controls {
 template <typename MessageBase>
 class ListenerList {
  public:
-  using Function = std::function<void(MessageBase*)>;
-  using FunctionPtr = std::shared_ptr<Function>;
+  using Functions = velkcore::SharedFunctions<void(MessageBase*)>;
+  using Function = typename Functions::Function;
+  using FunctionPtr = typename Functions::FunctionPtr;
 
   ListenerList() = default;
   ListenerList(const ListenerList&) = delete;
   ListenerList& operator=(const ListenerList&) = delete;
-  ~ListenerList() { state_->entries.clear(); }
 
   // A null listener is an input-contract violation; one already in the list is
   // not added twice.
   void Add(const FunctionPtr& listener) {
-    velkcore::RequireInput(listener != nullptr);
-    DropEmptyEntries();
-    if (!Contains(listener)) state_->entries.push_back(listener);
+    listeners_.DropEmptyFunctions();
+    listeners_.Add(listener);
   }
-  bool Remove(const FunctionPtr& listener) {
-    auto& entries = state_->entries;
-    const auto found = std::find(entries.begin(), entries.end(), listener);
-    if (found == entries.end()) return false;
-    entries.erase(found);
-    return true;
-  }
-  bool Contains(const FunctionPtr& listener) const {
-    const auto& entries = state_->entries;
-    return std::find(entries.begin(), entries.end(), listener) != entries.end();
-  }
-  void DropEmptyEntries() {
-    std::erase_if(state_->entries, [](const FunctionPtr& f) { return !f || !*f; });
-  }
-  void Clear() { state_->entries.clear(); }
+  bool Remove(const FunctionPtr& listener) { return listeners_.Remove(listener); }
+  bool Contains(const FunctionPtr& listener) const { return listeners_.Contains(listener); }
+  void Clear() { listeners_.Clear(); }
   // Entries, empty ones included.
-  std::size_t Size() const { return state_->entries.size(); }
-  bool Empty() const { return state_->entries.empty(); }
+  std::size_t Size() const { return listeners_.Size(); }
+  bool Empty() const { return listeners_.Empty(); }
 
   // Calls every live entry in order. A listener that throws ends the send and
   // the exception reaches the caller.
-  void Send(MessageBase* message) const {
-    const std::shared_ptr<State> state = state_;
-    const std::vector<FunctionPtr> snapshot = state->entries;
-    for (const FunctionPtr& entry : snapshot) {
-      const auto& live = state->entries;
-      if (std::find(live.begin(), live.end(), entry) == live.end()) continue;
-      // A copy: the listener may empty its own callback while it runs.
-      const Function call = *entry;
-      if (call) call(message);
-    }
-  }
+  void Send(MessageBase* message) const { listeners_.CallSkippingEmpty(message); }
 
  private:
-  struct State {
-    std::vector<FunctionPtr> entries;
-  };
-  std::shared_ptr<State> state_ = std::make_shared<State>();
+  Functions listeners_;
 };
 
 using ControlListenerList = ListenerList<ui::MessageT<ui::UI_Node>>;
