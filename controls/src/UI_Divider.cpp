@@ -19,8 +19,19 @@ UI_Divider::UI_Divider() {
 UI_Divider::~UI_Divider() = default;
 
 bool UI_Divider::IsVertical() const {
+  if (vertical_) return *vertical_;
   const velkcore::RectT<float> r = UI_GetLocalRectF(false);
   return r.height > r.width;
+}
+
+void UI_Divider::SetSeparatorFrame(bool acrossColumn, const arrange::RectF& frame) {
+  // Between two children of a row the line stands upright; between two of a column it lies flat.
+  const bool vertical = !acrossColumn;
+  if (vertical_ != vertical) {
+    vertical_ = vertical;
+    UI_Invalidate(nullptr, {});
+  }
+  UI_SetLocalRectF(frame);
 }
 
 void UI_Divider::UI_Draw(pictel::Pictel* context) const {

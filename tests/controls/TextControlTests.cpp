@@ -111,5 +111,15 @@ TEST_F(TextControlTest, ADividerRunsAlongItsLongerSide) {
   EXPECT_TRUE(down->IsVertical());
 }
 
+TEST_F(TextControlTest, ADividerInAGapRunsAcrossTheGapWhateverItsShape) {
+  auto divider = Add<UI_Divider>({0, 0, 1, 1});
+  // A wide gap between two short children of a row: still an upright line.
+  divider->SetSeparatorFrame(false, {10, 0, 30, 6});
+  EXPECT_TRUE(divider->IsVertical());
+  EXPECT_EQ(divider->UI_GetLocalRectF(true), (velkcore::RectT<float>{10, 0, 30, 6}));
+  divider->SetSeparatorFrame(true, {0, 10, 4, 20});
+  EXPECT_FALSE(divider->IsVertical());
+}
+
 }  // namespace
 }  // namespace velkui::controls::test

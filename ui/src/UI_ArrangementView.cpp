@@ -7,7 +7,7 @@
 
 #include <velkcore/Error.h>
 #include <velkui/arrange/Single.h>
-#include <velkui/controls/UI_StaticText.h>
+#include <velkui/controls/UI_Divider.h>
 
 #include "NodeHold.h"
 
@@ -47,15 +47,6 @@ bool SameSize(const PointF& a, const PointF& b) {
 float Measurable(float length) {
   return std::isfinite(length) && length > 0 ? length : 0.0f;
 }
-
-// The divider drawn in a gap between two children: it takes the frame the engine gives it
-// (already in the view's coordinates).
-class GapDivider : public controls::UI_Divider, public arrange::ISeparator {
- public:
-  void SetSeparatorFrame(bool /*acrossColumn*/, const RectF& frame) override {
-    UI_SetLocalRectF(frame);
-  }
-};
 
 }  // namespace
 
@@ -217,7 +208,7 @@ void UI_ArrangementView::SetDimensions(const PointF& size) {
 }
 
 NodeP UI_ArrangementView::NewSeparatorNode() {
-  return velkcore::MakeIntrusive<GapDivider>();
+  return velkcore::MakeIntrusive<controls::UI_Divider>();
 }
 
 arrange::ISeparator* UI_ArrangementView::BuildSeparator() {
