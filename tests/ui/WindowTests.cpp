@@ -300,7 +300,8 @@ TEST_F(WindowLifecycleTest, TimersTickThroughThePlatformAndStopWithTheirWindow) 
   auto view = View(window.get(), {0, 0, 10, 10}, "view");
   int ticks = 0;
   view->UI_InstallTimerNotifyFunction(
-      std::make_shared<UI_Node::TimerNotifyFunction>([&](std::int32_t) {
+      std::make_shared<UI_Node::TimerNotifyFunction>([&](std::int32_t id) {
+        if (id != 3) return false;
         ++ticks;
         return true;
       }));
@@ -309,6 +310,17 @@ TEST_F(WindowLifecycleTest, TimersTickThroughThePlatformAndStopWithTheirWindow) 
   EXPECT_EQ(ticks, 10);
   ASSERT_EQ(headless.GetTimers(Handle(*window)).size(), 1u);
   view->UI_RemoveTimer(3);
+  EXPECT_TRUE(headless.GetTimers(Handle(*window)).empty());
+  // A handler that answers false stops its platform timer with the first tick.
+  int lastTicks = 0;
+  view->UI_InstallTimerNotifyFunction(
+      std::make_shared<UI_Node::TimerNotifyFunction>([&](std::int32_t id) {
+        if (id == 4) ++lastTicks;
+        return false;
+      }));
+  view->UI_InstallTimer(0.05f, 4);
+  headless.RunFor(1);
+  EXPECT_EQ(lastTicks, 1);
   EXPECT_TRUE(headless.GetTimers(Handle(*window)).empty());
   view->UI_InstallTimer(0.1f, 3);
   const PlatformWindow handle = Handle(*window);

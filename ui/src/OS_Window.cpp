@@ -678,13 +678,7 @@ bool OS_Window::UI_Paint(OS_Event*) const {
     }
     clip = std::move(within);
   }
-  OSControlClipRects controls;
-  UI_GetOSControlClipRects(&controls);
-  for (const auto& [node, rect] : controls) {
-    std::vector<RectT<std::int32_t>> remaining;
-    for (const RectT<std::int32_t>& r : clip) SubtractRect(r, detail::RoundOut(rect), &remaining);
-    clip = std::move(remaining);
-  }
+  UI_ClipOSControls(clip);
   if (clip.empty()) return false;
 
   pictel::OSClipRegion region;
@@ -695,6 +689,16 @@ bool OS_Window::UI_Paint(OS_Event*) const {
   UI_DispatchDrawFromRoot(GetBackgroundColor(), &context, true);
   surface->Flush();
   return true;
+}
+
+void OS_Window::UI_ClipOSControls(std::vector<RectT<std::int32_t>>& clip) const {
+  OSControlClipRects controls;
+  UI_GetOSControlClipRects(&controls);
+  for (const auto& [node, rect] : controls) {
+    std::vector<RectT<std::int32_t>> remaining;
+    for (const RectT<std::int32_t>& r : clip) SubtractRect(r, detail::RoundOut(rect), &remaining);
+    clip = std::move(remaining);
+  }
 }
 
 // ---- Capture and focus ----

@@ -114,6 +114,10 @@ class OS_Window : public UI_Node, public UI_Window {
   virtual bool UI_DispatchMouseEventFromOS(OS_Event* event);
   virtual bool UI_DispatchKeyboardEventFromOS(OS_Event* event);
 
+  // Takes the areas of shown embedded platform windows (UI_GetOSControlClipRects)
+  // out of `clip` (client pixels), which they paint themselves.
+  void UI_ClipOSControls(std::vector<velkcore::RectT<std::int32_t>>& clip) const;
+
   // ---- The library's windows ----
   // Checks that a platform is installed (there is no window class to register).
   static void UI_Initialize();

@@ -28,6 +28,15 @@ namespace velkui::ui {
 //   "client" is a window's client area with (0, 0) at its top-left. Client
 //   rectangles are reported and set in screen coordinates, for child windows
 //   too (a child keeps its place relative to its parent when the parent moves).
+//   Setters take effect at once for the getters (OS_Window reads the result
+//   back right away): a backend keeps its own record and, when the window
+//   manager answers differently later, reports that with kMsgSize/kMsgMove.
+//   A backend may also report the library's own changes that way; windows
+//   ignore a report that matches what they have.
+// - Handles: OS_Window maps handles back to windows itself (UI_GetWindow);
+//   the backend needs no pointer to it. Messages for a destroyed window are
+//   dropped. Windows of other applications are never reported (the pointer
+//   over one is over "no window").
 // - Events. The backend turns native events into OS_Events (OS_Event.h lists
 //   the messages and their parameters) and hands them out one by one through
 //   GetNextEvent, in this order of priority: queued messages (input, posted
@@ -69,6 +78,9 @@ namespace velkui::ui {
 //   and answers false when it has nothing, so that no modal loop can hang a test.
 // - Failures to create a platform object raise velkcore errors; operations on
 //   a window that no longer exists do nothing (or answer a neutral value).
+// - Adding a backend: implement this class under ui/src/platform/<name>/ and
+//   return it from CreatePlatform (ui/src/platform/PlatformFactory.cpp), the
+//   one place where backends are chosen. Nothing above this interface changes.
 class Platform {
  public:
   Platform();
