@@ -29,7 +29,11 @@ UI_SubView::UI_SubView() {
   UI_SetNodeID("UI_SubView");
 }
 
-UI_SubView::~UI_SubView() = default;
+UI_SubView::~UI_SubView() {
+  // The children removed by the base destructor must no longer take this
+  // node for a sub-view (their matrices ask their parent's).
+  asSubView_ = nullptr;
+}
 
 bool UI_SubView::UI_IsSubView() const {
   return true;
