@@ -72,6 +72,24 @@ TEST_F(WindowLifecycleTest, NodesResizedDuringAUserResizeRepaintWhenItEnds) {
   EXPECT_TRUE(headless.HasPendingPaint(Handle(*window)));
 }
 
+TEST_F(WindowLifecycleTest, APanelDestroyedWithTheFocusInsideLeavesNoDanglingRole) {
+  // A panel built outside any window (an offscreen page, say).
+  class Field : public LoggingView {
+   public:
+    using LoggingView::LoggingView;
+    bool UI_InvalidateOnKeyboardFocusChange(bool) const override { return true; }
+  };
+  auto panel = View(nullptr, {10, 10, 100, 50}, "panel");
+  auto field = MakeView<Field>(panel.get(), {5, 5, 20, 10}, "field", log);
+  field->wantsFocus = true;
+  field->UI_GainKeyboardFocus();
+  field.reset();
+  // The last reference: the panel dies with its focused child inside, which
+  // leaves while its parent is half destroyed (the sanitizer build checks it).
+  panel.reset();
+  EXPECT_EQ(UI_Node::UI_GetKeyboardFocusLeafNode(), nullptr);
+}
+
 TEST_F(WindowLifecycleTest, WindowsAreFoundByHandleAndByNodeID) {
   auto a = MakeWindow({0, 0, 10, 10});
   auto b = MakeWindow({20, 0, 10, 10});
