@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <optional>
 #include <utility>
 
 #include <velkcore/Error.h>
@@ -39,8 +38,10 @@ NodeState ReadState(const UI_Node& node) {
           static_cast<std::uint8_t>(view.UI_GetLayoutBinding().Get() & kExpandingBindings)};
 }
 
-bool SameSize(const PointF& a, const PointF& b) {
-  return a.x == b.x && a.y == b.y;
+// Exact comparison in which a NaN length equals another NaN: a node that answers NaN is not
+// taken for one that changes all the time.
+bool SameLength(float a, float b) {
+  return a == b || (std::isnan(a) && std::isnan(b));
 }
 
 // Sizes the engine may measure: finite and not negative.
@@ -54,7 +55,7 @@ float Measurable(float length) {
 class UI_ArrangementView::NodeBridge : public arrange::Single {
  public:
   NodeBridge(UI_ArrangementView& view, UI_Node& node)
-      : view_(view), node_(node), recorded_(ReadState(node)) {}
+      : view_(view), node_(node), recorded_(ReadState(node)), seen_(recorded_.size) {}
 
   UI_Node& Node() const { return node_; }
 
@@ -71,20 +72,21 @@ class UI_ArrangementView::NodeBridge : public arrange::Single {
     return (recorded_.growth & kBindBottomToBottom) != 0;
   }
 
-  // Records a size, visibility or binding the node took on its own since it was last recorded
-  // (a size this bridge gave it does not count) and marks the leaf out of date. True when it
-  // did.
+  // Records a size, visibility or binding the node took on its own since it was last looked
+  // at, and marks the leaf out of date; true when it did. A size this bridge gave the node is no
+  // change, and each axis counts on its own: a stretched child that changes its height keeps
+  // its natural width, not the stretched one.
   bool RecordChanges() {
     const NodeState now = ReadState(node_);
-    const bool resized =
-        !SameSize(now.size, recorded_.size) && !(placed_ && SameSize(now.size, *placed_));
-    if (!resized && now.visible == recorded_.visible && now.growth == recorded_.growth) {
+    const bool widthChanged = !SameLength(now.size.x, seen_.x);
+    const bool heightChanged = !SameLength(now.size.y, seen_.y);
+    if (!widthChanged && !heightChanged && now.visible == recorded_.visible &&
+        now.growth == recorded_.growth) {
       return false;
     }
-    if (resized) {
-      recorded_.size = now.size;
-      placed_.reset();
-    }
+    if (widthChanged) recorded_.size.x = now.size.x;
+    if (heightChanged) recorded_.size.y = now.size.y;
+    seen_ = now.size;
     recorded_.visible = now.visible;
     recorded_.growth = now.growth;
     MarkInvalid();
@@ -98,7 +100,7 @@ class UI_ArrangementView::NodeBridge : public arrange::Single {
     const PointT<float> origin = view_.EngineToLocal(view_, {rect.left, rect.top});
     const RectT<float> frame{origin.x, origin.y, ExpandedWidth(rect.width),
                              ExpandedHeight(rect.height)};
-    placed_ = PointF{frame.width, frame.height};
+    seen_ = PointF{frame.width, frame.height};
     // Last: the node's reaction may remove it from the view, which destroys this bridge.
     const NodeP keep = detail::Hold(&node_);
     node_.UI_SetLocalRectF(frame);
@@ -108,7 +110,8 @@ class UI_ArrangementView::NodeBridge : public arrange::Single {
   UI_ArrangementView& view_;
   UI_Node& node_;
   NodeState recorded_;
-  std::optional<PointF> placed_;
+  // The node's size when this bridge last set or read it.
+  PointF seen_;
 };
 
 // The engine's separator of one gap: hands the frame, in the view's coordinates, to the node
@@ -139,6 +142,8 @@ UI_ArrangementView::UI_ArrangementView(arrange::GroupArrangementType type)
 
 UI_ArrangementView::~UI_ArrangementView() {
   // The leaves and separators go while the group they belong to is still whole.
+  bridgeAtIndex_.clear();
+  bridgeOfNode_.clear();
   bridges_.clear();
   for (UI_ArrangementView* nested : nested_) {
     if (nested->Parent() == this) nested->SetParent(nullptr);
@@ -273,8 +278,16 @@ void UI_ArrangementView::RebuildArrangeables() {
   }
   // Leaves of nodes that left go first (the group forgets them as they are destroyed), and
   // views no longer nested here become roots of their own.
+  bridgeAtIndex_.clear();
+  bridgeOfNode_.clear();
   bridges_.clear();
   bridges_ = std::move(bridges);
+  bridgeAtIndex_.resize(ChildSize(), nullptr);
+  for (const auto& bridge : bridges_) {
+    const auto index = static_cast<std::size_t>(bridge->Node().UI_GetIndex());
+    if (index < bridgeAtIndex_.size()) bridgeAtIndex_[index] = bridge.get();
+    bridgeOfNode_.emplace(&bridge->Node(), bridge.get());
+  }
   for (UI_ArrangementView* old : nested_) {
     if (std::find(nested.begin(), nested.end(), old) == nested.end() && old->Parent() == this) {
       old->SetParent(nullptr);
@@ -309,6 +322,30 @@ void UI_ArrangementView::ChildRemoved(UI_Node* node) {
 void UI_ArrangementView::ChildOrderChanged() {
   UI_SubView::ChildOrderChanged();
   RebuildArrangeables();
+}
+
+UI_ArrangementView::NodeBridge* UI_ArrangementView::FindBridge(const UI_Node& node) const {
+  const auto index = static_cast<std::size_t>(node.UI_GetIndex());
+  if (index < bridgeAtIndex_.size()) {
+    NodeBridge* bridge = bridgeAtIndex_[index];
+    if (bridge != nullptr && &bridge->Node() == &node) return bridge;
+  }
+  const auto found = bridgeOfNode_.find(&node);
+  return found != bridgeOfNode_.end() ? found->second : nullptr;
+}
+
+void UI_ArrangementView::ChildGeometryChanged(const UI_Node& child) {
+  UI_SubView::ChildGeometryChanged(child);
+  // Separators and nested views are sized by the engine itself; a frame this view gave is no
+  // change either (RecordChanges knows it).
+  NodeBridge* bridge = FindBridge(child);
+  if (bridge == nullptr || !bridge->RecordChanges()) return;
+  // A tree that cannot arrange now (hidden or detached) stays marked until it can.
+  const UI_ArrangementView* root = RootView();
+  if (root != nullptr && !root->CanArrangeAsRoot()) return;
+  // While the tree is being arranged this only asks the arrangement under way for another pass.
+  const NodeP keep = detail::Hold(this);
+  Invalidate();
 }
 
 // ---- Arranging ----

@@ -241,6 +241,8 @@ void UI_Container::ChildRemoved(UI_Node*) {}
 
 void UI_Container::ChildOrderChanged() {}
 
+void UI_Container::ChildGeometryChanged(const UI_Node&) {}
+
 bool UI_Container::AllowFocusToAdvanceFromChildren() const {
   return false;
 }

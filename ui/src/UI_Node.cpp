@@ -390,7 +390,9 @@ UI_Node* UI_Node::UI_ChildGetFromID(const std::string& id) const {
 // ---- State ----
 
 void UI_Node::UI_GeometryChanged() const {
-  if (parent_ != nullptr) parent_->InvalidateChildBox(index_);
+  if (parent_ == nullptr) return;
+  parent_->InvalidateChildBox(index_);
+  parent_->ChildGeometryChanged(*this);
 }
 
 void UI_Node::UI_SetDisabled(bool disabled) {

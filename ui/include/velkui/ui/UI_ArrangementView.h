@@ -1,6 +1,7 @@
 #pragma once
 
 #include <memory>
+#include <unordered_map>
 #include <vector>
 
 #include <velkui/arrange/DefaultGroup.h>
@@ -26,9 +27,12 @@ namespace velkui::ui {
 // window's client area, in the view's own units); every node is placed in its own parent's
 // coordinates. A nested view's origin and size are set from what the engine reports.
 //
-// A child that changes size, visibility or binding on its own is noticed when it is next
-// placed, which then runs another pass with what it has become; UpdateChildSizes notices it
-// at once.
+// A child that changes size, visibility or binding on its own (anything but this view setting
+// its frame) is noticed as it happens, through ChildGeometryChanged, and the tree of groups is
+// arranged again at once. A change made while the tree is being arranged (a child that
+// resizes itself when it is placed) only marks it: the arrangement under way runs another pass
+// with what the child has become, and never re-enters itself. Changes that do not reach
+// UI_GeometryChanged are noticed when the child is next placed, or by UpdateChildSizes.
 class UI_ArrangementView : public UI_SubView, public arrange::DefaultGroup<arrange::DynamicGroup> {
  public:
   explicit UI_ArrangementView(
@@ -63,6 +67,8 @@ class UI_ArrangementView : public UI_SubView, public arrange::DefaultGroup<arran
   void ChildAdded(UI_Node* node) override;
   void ChildRemoved(UI_Node* node) override;
   void ChildOrderChanged() override;
+  // Records what a child became and arranges again when it changed.
+  void ChildGeometryChanged(const UI_Node& child) override;
   void UI_NodeChanged(NodeChange change) override;
 
   // The number of separator nodes the view holds.
@@ -93,10 +99,16 @@ class UI_ArrangementView : public UI_SubView, public arrange::DefaultGroup<arran
   // the tree of nodes whose root arrangement view is this view's).
   velkcore::PointT<float> EngineToLocal(const UI_Node& target, const velkcore::PointT<float>& p);
   bool IsSeparatorNode(const UI_Node* node) const;
+  NodeBridge* FindBridge(const UI_Node& node) const;
 
   bool separatorsEnabled_ = false;
   bool changingSeparators_ = false;
   std::vector<std::unique_ptr<NodeBridge>> bridges_;
+  // The leaf of each child node, for the notices of ChildGeometryChanged: by the child's index
+  // when the list was last rebuilt (separators come and go without a rebuild and may shift
+  // later children), and by node.
+  std::vector<NodeBridge*> bridgeAtIndex_;
+  std::unordered_map<const UI_Node*, NodeBridge*> bridgeOfNode_;
   std::vector<UI_ArrangementView*> nested_;
   std::vector<std::unique_ptr<SeparatorBridge>> separators_;
   // What the last look at this view's place in the tree found, so that only real changes

@@ -80,6 +80,12 @@ class UI_Container {
   virtual void ChildAdded(UI_Node* node);
   virtual void ChildRemoved(UI_Node* node);
   virtual void ChildOrderChanged();
+  // A child's place, size or visibility changed (or something else its parent reads to lay
+  // it out, such as a sub-view's layout binding): called by the child's
+  // UI_Node::UI_GeometryChanged, after its cached box was marked stale. It runs in the middle of
+  // the child's change (the child's own size and node-change handlers come after it), and on
+  // every frame change of every child, so an override should be quick. Does nothing by default.
+  virtual void ChildGeometryChanged(const UI_Node& child);
   // Whether focus advancing with Tab may leave this container's children for
   // the siblings of this container.
   virtual bool AllowFocusToAdvanceFromChildren() const;

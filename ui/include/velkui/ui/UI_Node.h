@@ -150,10 +150,12 @@ class UI_Node : public UI_NodeBase {
   const_iterator UI_ChildFindFromID(const std::string& id) const;
   UI_Node* UI_ChildGetFromID(const std::string& id) const;
 
-  // Tells the parent that this node's place, size or visibility changed. The
+  // Tells the parent that this node's place, size or visibility changed: its
+  // cached box goes stale and UI_Container::ChildGeometryChanged hears of it. The
   // sub-view setters call it; a class that overrides UI_IsShown,
   // UI_GetSelfToParentMatrix, UI_GetLocalRectF or UI_ReceivesEventsFromOS calls
-  // it whenever their answers change.
+  // it whenever their answers change, and so does one that changes what its
+  // parent reads to lay it out (a sub-view's layout binding).
   void UI_GeometryChanged() const;
 
   // ---- Identity and state ----
