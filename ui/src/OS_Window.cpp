@@ -817,8 +817,8 @@ void OS_Window::RemoveCloseFunction(const std::shared_ptr<CloseFunction>& f) {
   closeFunctions_.Remove(f);
 }
 
-void OS_Window::HandleCloseRequest() {
-  if (closing_) return;
+bool OS_Window::RunCloseFunctions() {
+  if (closing_) return true;
   const NodeP keep = detail::Hold(this);
   closing_ = true;
   bool vetoed = false;
@@ -828,7 +828,16 @@ void OS_Window::HandleCloseRequest() {
     closing_ = false;
     throw;
   }
-  if (!vetoed) UI_Show(false);
+  closing_ = false;
+  return vetoed;
+}
+
+void OS_Window::HandleCloseRequest() {
+  if (closing_) return;
+  const NodeP keep = detail::Hold(this);
+  if (RunCloseFunctions()) return;
+  closing_ = true;
+  UI_Show(false);
   closing_ = false;
 }
 

@@ -167,6 +167,9 @@ class OS_Window : public UI_Node, public UI_Window {
   velkcore::RectT<std::int32_t> GetEmbeddedScreenRect() const;
   // Handles a close request (kMsgClose).
   void HandleCloseRequest();
+  // Asks the close-request functions; true when one keeps the window open (or
+  // a close request is being handled already).
+  bool RunCloseFunctions();
   // Paints through an offscreen buffer even when the platform does not ask for one.
   void SetPaintsBuffered(bool buffered) { paintBuffered_ = buffered; }
   bool GetPaintsBuffered() const { return paintBuffered_; }
