@@ -6,14 +6,12 @@
 #include <velkui/ui/HeadlessPlatform.h>
 #include <velkui/ui/Platform.h>
 
+#include "x11/X11Platform.h"
+
 namespace velkui::ui {
 
 namespace {
 
-constexpr std::string_view kPlatformUnavailableKey =
-    "$$$/velkui/ui/Error/PlatformUnavailable=The window-system backend \"^0\" is not available in "
-    "this build (set VELKUI_PLATFORM=headless to run without a display).";
-constexpr std::int32_t kPlatformUnavailableNumber = 20;
 constexpr std::string_view kUnknownPlatformKey =
     "$$$/velkui/ui/Error/UnknownPlatform=Unknown window-system backend \"^0\" in VELKUI_PLATFORM "
     "(use x11 or headless).";
@@ -28,11 +26,8 @@ std::string ReadEnvironment(const char* name) {
 
 std::unique_ptr<Platform> CreatePlatform(std::string_view name) {
   if (name == "headless") return std::make_unique<HeadlessPlatform>();
-  if (name == "x11") {
-    velkcore::ThrowError(velkcore::ErrorLevel::kError, kPlatformUnavailableKey,
-                         velkcore::kCategoryUserInterface, kPlatformUnavailableNumber, 0,
-                         std::string(name));
-  }
+  // Raises 103/20 (naming x11 and the display) when the display cannot be opened.
+  if (name == "x11") return std::make_unique<X11Platform>();
   velkcore::ThrowError(velkcore::ErrorLevel::kError, kUnknownPlatformKey,
                        velkcore::kCategoryUserInterface, kUnknownPlatformNumber, 0,
                        std::string(name));

@@ -1,0 +1,209 @@
+#pragma once
+
+// The state of the X11 backend, shared by X11Platform.cpp (the platform
+// operations) and X11Events.cpp (X events into library messages).
+
+#include <array>
+#include <chrono>
+#include <deque>
+#include <map>
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include <velkcore/Geometry.h>
+#include <velkui/ui/OS_Event.h>
+#include <velkui/ui/PlatformTypes.h>
+
+#include "TimerHeap.h"
+#include "X11BackBuffer.h"
+#include "X11Clipboard.h"
+#include "X11Connection.h"
+#include "X11Cursors.h"
+#include "X11Keyboard.h"
+#include "X11Platform.h"
+
+namespace velkui::ui::x11 {
+
+using velkcore::PointT;
+using velkcore::RectT;
+
+struct Insets {
+  std::int32_t left = 0;
+  std::int32_t right = 0;
+  std::int32_t top = 0;
+  std::int32_t bottom = 0;
+};
+
+struct InputContextDeleter {
+  void operator()(XIC context) const {
+    if (context != nullptr) XDestroyIC(context);
+  }
+};
+using InputContext = std::unique_ptr<std::remove_pointer_t<XIC>, InputContextDeleter>;
+
+struct WindowRecord {
+  PlatformWindow handle = kNoPlatformWindow;
+  // The parent of a child window, the owner of any other.
+  PlatformWindow parent = kNoPlatformWindow;
+  bool child = false;
+  // A pop-up without caption: placed by us, never by a window manager.
+  bool overrideRedirect = false;
+  velkcore::UTF16String title;
+  // Screen coordinates for top-level windows; relative to the parent's client
+  // origin for child windows.
+  RectT<std::int32_t> client;
+  // The window manager's frame around the client area.
+  Insets frame;
+  std::uint32_t style = 0;
+  std::uint32_t exStyle = 0;
+  bool visible = false;
+  bool enabled = true;
+  bool minimized = false;
+  // Whether a window manager put the window into a frame of its own.
+  bool reparented = false;
+  float opacity = 1.0f;
+  std::optional<pictel::ColorRGBA> colorKey;
+  std::unique_ptr<X11BackBuffer> buffer;
+  std::vector<RectT<std::int32_t>> pending;
+  bool trackLeave = false;
+  InputContext inputContext;
+  // Client rectangles asked of the server whose ConfigureNotify has not come back.
+  std::deque<RectT<std::int32_t>> configureRequests;
+  std::int32_t paintCount = 0;
+};
+
+// One message of the queue, with what the backend needs to know when it is taken.
+struct QueuedMessage {
+  OS_Event event;
+  // Key presses: the text they type (character messages follow in TranslateEvent).
+  std::u16string text;
+  // Key messages: the side of a modifier, else the virtual key.
+  std::int16_t sideKey = 0;
+  // Input messages: the X modifier state before the event.
+  std::optional<unsigned> modifierState;
+};
+
+}  // namespace velkui::ui::x11
+
+namespace velkui::ui {
+
+struct X11Platform::Impl {
+  template <typename T>
+  using PointT = velkcore::PointT<T>;
+  template <typename T>
+  using RectT = velkcore::RectT<T>;
+
+  Impl();
+  ~Impl();
+
+  // Members in the order they must be built (and the reverse of their end):
+  // the windows go before the input method and the connection.
+  x11::X11Connection connection;
+  Display* display;
+  x11::X11Keyboard keyboard;
+  x11::X11Cursors cursors;
+  x11::X11Clipboard clipboard;
+  std::map<PlatformWindow, x11::WindowRecord> windows;
+
+  // Top-level windows in the order they were last activated (latest last).
+  std::vector<PlatformWindow> activationOrder;
+  std::deque<x11::QueuedMessage> queue;
+  std::optional<x11::QueuedMessage> lastKeyPress;
+  x11::TimerHeap timers;
+  PlatformWindow capture = kNoPlatformWindow;
+  PlatformWindow focus = kNoPlatformWindow;
+  PlatformWindow active = kNoPlatformWindow;
+  PlatformWindow hover = kNoPlatformWindow;
+  bool applicationActive = false;
+  // When we last asked for activation ourselves (the focus may lag behind).
+  double ownActivationTime = -1.0;
+  bool focusCheckPending = false;
+  // What GetKeyState answers (as of the messages taken) and which keycodes
+  // the X server reported down.
+  std::array<KeyState, 256> keys{};
+  std::array<bool, 256> keycodeDown{};
+  struct Press {
+    PlatformWindow window = kNoPlatformWindow;
+    std::int32_t button = 0;
+    Time time = 0;
+    PointT<std::int32_t> point;
+    bool wasDouble = false;
+  };
+  std::optional<Press> lastPress;
+  std::uint32_t doubleClickTime = 500;
+  PointT<std::int32_t> doubleClickSize{4, 4};
+  CursorShape cursor = CursorShape::kArrow;
+  bool quitPending = false;
+  std::int32_t quitCode = 0;
+  std::vector<MonitorDescription> monitors;
+  bool monitorsValid = false;
+  int randrEventBase = -1;
+  bool shapeAvailable = false;
+  bool xtestAvailable = false;
+  Time lastInputTime = CurrentTime;
+  std::array<std::int32_t, 2> wheelRemainder{};
+
+  // ---- Records ----
+  x11::WindowRecord* Find(PlatformWindow handle);
+  const x11::WindowRecord* Find(PlatformWindow handle) const;
+  PointT<std::int32_t> ClientOrigin(const x11::WindowRecord& record) const;
+  RectT<std::int32_t> ScreenClient(const x11::WindowRecord& record) const;
+  RectT<std::int32_t> ScreenFrame(const x11::WindowRecord& record) const;
+  bool IsShownOnScreen(const x11::WindowRecord& record) const;
+  bool IsEnabledForInput(PlatformWindow handle) const;
+  PlatformWindow TopLevelOf(PlatformWindow handle) const;
+  bool IsWithin(PlatformWindow handle, PlatformWindow ancestor) const;
+  std::vector<PlatformWindow> ChildrenOf(PlatformWindow handle) const;
+  std::vector<PlatformWindow> TopLevels() const;
+
+  // ---- Queue ----
+  double Now() const;
+  void Post(PlatformWindow window, std::uint32_t message, std::uint64_t w = 0, std::int64_t l = 0);
+  void Enqueue(x11::QueuedMessage message);
+  void UpdateKeyState(const x11::QueuedMessage& message);
+  void SyncModifiers(unsigned state);
+  bool IsPaintable(const x11::WindowRecord& record) const;
+  void Invalidate(x11::WindowRecord& record, const RectT<std::int32_t>* rect);
+  void ApplyClientRect(x11::WindowRecord& record, const RectT<std::int32_t>& relative);
+  // Sleeps in poll() until the connection has data or `seconds` pass (< 0: no limit).
+  bool Wait(double seconds);
+
+  // ---- Activation and focus ----
+  void SetFocus(PlatformWindow handle);
+  void Activate(PlatformWindow handle, bool byClick, bool askServer);
+  void ActivateNextAfter(PlatformWindow leaving);
+  void DeactivateApplication();
+  void PostLeaveIfTracked(PlatformWindow handle);
+  void LoseCapture();
+
+  // ---- Pointer ----
+  PlatformWindow WindowAtScreen(const PointT<std::int32_t>& point) const;
+  PointT<std::int32_t> QueryPointer() const;
+  PlatformWindow PointerTarget(PlatformWindow eventWindow, const PointT<std::int32_t>& eventPoint,
+                               const PointT<std::int32_t>& screen) const;
+  PointT<std::int32_t> ClientPoint(PlatformWindow target, PlatformWindow eventWindow,
+                                   const PointT<std::int32_t>& eventPoint,
+                                   const PointT<std::int32_t>& screen) const;
+  void ApplyCursor();
+
+  // ---- X events (X11Events.cpp) ----
+  // Reads every event the connection has and turns it into messages.
+  void DrainConnection();
+  void HandleEvent(XEvent& event);
+  void HandleButton(const XButtonEvent& event, bool press);
+  void HandleMotion(const XMotionEvent& event);
+  void HandleCrossing(const XCrossingEvent& event);
+  void HandleKey(XKeyEvent& event, bool press);
+  void HandleConfigure(const XConfigureEvent& event);
+  void HandleExpose(const XExposeEvent& event);
+  void HandleProperty(const XPropertyEvent& event);
+  void HandleClientMessage(const XClientMessageEvent& event);
+  void ReconcileFocus();
+  void DisplayChanged();
+  void ReadFrameExtents(x11::WindowRecord& record);
+  void ReadWindowState(x11::WindowRecord& record);
+};
+
+}  // namespace velkui::ui
