@@ -4,25 +4,34 @@
 
 #include <velkcore/RefCountedObject.h>
 #include <velkui/pictel/PathInterface.h>
+#include <velkui/pictel/PathShapes.h>
 #include <velkui/pictel/PenInterface.h>
+#include <velkui/pictel/PictelHandles.h>
 #include <velkui/pictel/SupplierInterface.h>
 #include <velkui/pictel/SurfaceInterface.h>
+#include <velkui/ui/Theme.h>
 
 namespace gallery {
 
 namespace {
 
 using velkcore::RectT;
+using PointF = velkcore::PointT<float>;
 using velkui::arrange::GroupArrangementType;
 using velkui::pictel::ColorRGBA;
 
 constexpr ColorRGBA kBackground{0.93f, 0.94f, 0.96f, 1};
 constexpr ColorRGBA kGroupFill{1, 1, 1, 1};
 constexpr ColorRGBA kGroupFrame{0.78f, 0.81f, 0.86f, 1};
-constexpr std::array<ColorRGBA, 3> kCardColors{{
-    {0.16f, 0.45f, 0.86f, 1},
-    {0.20f, 0.62f, 0.47f, 1},
-    {0.90f, 0.55f, 0.18f, 1},
+struct CardSpec {
+  const char16_t* title;
+  const char16_t* reading;
+  ColorRGBA color;
+};
+constexpr std::array<CardSpec, 3> kCards{{
+    {u"Input", u"\u221212.0 dB", {0.16f, 0.45f, 0.86f, 1}},
+    {u"Tempo", u"120 BPM", {0.20f, 0.62f, 0.47f, 1}},
+    {u"Output", u"\u22120.3 dB", {0.90f, 0.55f, 0.18f, 1}},
 }};
 constexpr std::array<ColorRGBA, 5> kToolColors{{
     {0.33f, 0.38f, 0.47f, 1},
@@ -31,6 +40,11 @@ constexpr std::array<ColorRGBA, 5> kToolColors{{
     {0.25f, 0.58f, 0.70f, 1},
     {0.62f, 0.64f, 0.28f, 1},
 }};
+constexpr ColorRGBA kWhite{1, 1, 1, 1};
+
+ColorRGBA Darker(const ColorRGBA& color) {
+  return {color.red * 0.75f, color.green * 0.75f, color.blue * 0.75f, color.alpha};
+}
 
 void Outline(velkui::pictel::Pictel* context, const RectT<float>& r, const ColorRGBA& color) {
   const auto pen = context->GetSupplier()->NewPen(color, 1);
@@ -39,24 +53,102 @@ void Outline(velkui::pictel::Pictel* context, const RectT<float>& r, const Color
   context->GetSurface()->StrokePath(*pen, *path);
 }
 
-// A coloured block with a darker band along its top, standing for a card or a tool.
+void Fill(velkui::pictel::Pictel* context, const velkui::pictel::PathP& path,
+          const ColorRGBA& color) {
+  context->GetSurface()->FillPath(*velkui::pictel::BrushP(*context->GetSupplier(), color), *path,
+                                  velkui::pictel::FillType::kWinding);
+}
+
+void Label(velkui::pictel::Pictel* context, const char16_t* text, float x, float baseline,
+           float size, bool bold) {
+  const velkui::pictel::FontP font(*context->GetSupplier(), velkui::ui::Theme::Get().GetFontName(0),
+                                   bold ? u"Bold" : u"", size);
+  context->GetSurface()->DrawString(*velkui::pictel::BrushP(*context->GetSupplier(), kWhite), *font,
+                                    text, {x, baseline}, velkui::pictel::TextAlignment::kStart,
+                                    velkui::pictel::TextTruncation::kEndEllipsis, 200);
+}
+
+// A fixed-size block of the panel.
 class Tile : public velkui::ui::UI_SubView {
  public:
-  Tile(float width, float height, const ColorRGBA& color) : color_(color) {
+  Tile(float width, float height) {
     UI_SetLocalRectF({0, 0, width, height});
     UI_Show(true);
   }
+};
+
+// A card: a coloured block with a title band and a reading.
+class Card : public Tile {
+ public:
+  explicit Card(const CardSpec& spec) : Tile(150, 64), spec_(spec) {}
+
+  void UI_Draw(velkui::pictel::Pictel* context) const override {
+    const RectT<float> r = UI_GetLocalRectF(false);
+    auto& surface = *context->GetSurface();
+    surface.PaintRect(spec_.color, r);
+    surface.PaintRect(Darker(spec_.color), {r.left, r.top, r.width, 20});
+    Label(context, spec_.title, 8, 14, 11, true);
+    Label(context, spec_.reading, 8, 50, 18, true);
+    Tile::UI_Draw(context);
+  }
+
+ private:
+  CardSpec spec_;
+};
+
+enum class Glyph { kPlay, kStop, kRecord, kLoop, kAdd };
+
+// A tool: a coloured button face with a white glyph.
+class Tool : public Tile {
+ public:
+  Tool(Glyph glyph, const ColorRGBA& color) : Tile(40, 32), glyph_(glyph), color_(color) {}
 
   void UI_Draw(velkui::pictel::Pictel* context) const override {
     const RectT<float> r = UI_GetLocalRectF(false);
     auto& surface = *context->GetSurface();
     surface.PaintRect(color_, r);
-    const ColorRGBA band{color_.red * 0.75f, color_.green * 0.75f, color_.blue * 0.75f, 1};
-    surface.PaintRect(band, {r.left, r.top, r.width, r.height < 24 ? 4.0f : 12.0f});
-    UI_SubView::UI_Draw(context);
+    surface.PaintRect(Darker(color_), {r.left, r.top + r.height - 3, r.width, 3});
+    DrawGlyph(context, {r.left + r.width / 2, r.top + (r.height - 3) / 2});
+    Tile::UI_Draw(context);
   }
 
  private:
+  void DrawGlyph(velkui::pictel::Pictel* context, PointF c) const {
+    const auto* supplier = context->GetSupplier();
+    velkui::pictel::PathP path(*supplier);
+    switch (glyph_) {
+      case Glyph::kPlay:
+        path->MoveTo(PointF{c.x - 4, c.y - 6});
+        path->LineTo(PointF{c.x + 6, c.y});
+        path->LineTo(PointF{c.x - 4, c.y + 6});
+        path->Close();
+        break;
+      case Glyph::kStop:
+        path->AddRect(RectT<float>{c.x - 5, c.y - 5, 10, 10});
+        break;
+      case Glyph::kRecord:
+        velkui::GetEllipsePath(supplier, {c.x - 6, c.y - 6, 12, 12}, &path);
+        break;
+      case Glyph::kLoop: {
+        const auto pen = supplier->NewPen(kWhite, 2);
+        velkui::pictel::PathP ring;
+        velkui::GetRoundedRectPath(supplier, {c.x - 7, c.y - 4, 14, 9}, 4, &ring);
+        context->GetSurface()->StrokePath(*pen, *ring);
+        path->MoveTo(PointF{c.x + 1, c.y - 8});
+        path->LineTo(PointF{c.x + 5, c.y - 4});
+        path->LineTo(PointF{c.x + 1, c.y});
+        path->Close();
+        break;
+      }
+      case Glyph::kAdd:
+        path->AddRect(RectT<float>{c.x - 6, c.y - 1, 12, 2});
+        path->AddRect(RectT<float>{c.x - 1, c.y - 6, 2, 12});
+        break;
+    }
+    Fill(context, path, kWhite);
+  }
+
+  Glyph glyph_;
   ColorRGBA color_;
 };
 
@@ -110,13 +202,13 @@ LayoutPanel::LayoutPanel(float width, float height) {
 
   cards_ = MakeGroup(GroupArrangementType::Flipping, 10, 8);
   cards_->EnableSeparators(true);
-  for (const ColorRGBA& color : kCardColors) {
-    cards_->ChildPushBack(velkcore::MakeIntrusive<Tile>(150.0f, 64.0f, color));
-  }
+  for (const CardSpec& card : kCards) cards_->ChildPushBack(velkcore::MakeIntrusive<Card>(card));
   tools_ = MakeGroup(GroupArrangementType::HorizontalWrapping, 6, 8);
-  for (int i = 0; i < 10; ++i) {
-    tools_->ChildPushBack(velkcore::MakeIntrusive<Tile>(
-        40.0f, 32.0f, kToolColors[static_cast<std::size_t>(i) % kToolColors.size()]));
+  constexpr std::array<Glyph, 5> kGlyphs{Glyph::kPlay, Glyph::kStop, Glyph::kRecord, Glyph::kLoop,
+                                         Glyph::kAdd};
+  for (std::size_t i = 0; i < 10; ++i) {
+    tools_->ChildPushBack(velkcore::MakeIntrusive<Tool>(kGlyphs[i % kGlyphs.size()],
+                                                        kToolColors[i % kToolColors.size()]));
   }
   content_->ChildPushBack(cards_);
   content_->ChildPushBack(tools_);
