@@ -15,6 +15,8 @@
 #include <velkui/controls/UI_TextButton.h>
 #include <velkui/pictel/PathShapes.h>
 #include <velkui/pictel/SurfaceInterface.h>
+#include <velkui/ui/DefaultKeyframeTheme.h>
+#include <velkui/ui/KeyframeThemeEditor.h>
 #include <velkui/ui/Theme.h>
 #include <velkui/ui/UI_NodeManager.h>
 
@@ -248,9 +250,17 @@ velkui::ui::SubViewP BuildControlsShowcase(velkui::pictel::Pictel& context,
 
 void DrawControlsPage(velkui::pictel::Pictel& context, const RectT<float>& area) {
   ui::Theme& theme = ui::Theme::Get();
+  // A theme that takes key frames follows the brightness; another gets the dark colours set.
+  auto* editor = dynamic_cast<ui::KeyframeThemeEditor*>(&theme);
+  if (editor != nullptr) ui::LoadDefaultKeyframeTheme(*editor);
+  const float brightness = theme.GetBrightness();
   const float gap = std::max(area.width - 2 * kControlsShowcaseWidth, 0.0f);
   for (const bool dark : {false, true}) {
-    if (dark) controls::ApplyDarkControlColors(theme);
+    if (dark && editor != nullptr) {
+      theme.SetBrightness(ui::kDarkInterfaceBrightness);
+    } else if (dark) {
+      controls::ApplyDarkControlColors(theme);
+    }
     theme.NotifyThemeChanged();
     const ui::SubViewP panel =
         BuildControlsShowcase(context, dark ? u"Dark interface" : u"Light interface");
@@ -261,7 +271,7 @@ void DrawControlsPage(velkui::pictel::Pictel& context, const RectT<float>& area)
     panel->UI_DispatchDrawFromRoot({0, 0, 0, 0}, &context, false);
     surface.PopStateStack();
   }
-  theme.Update();
+  theme.SetBrightness(brightness);
   theme.NotifyThemeChanged();
 }
 

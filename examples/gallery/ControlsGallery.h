@@ -23,10 +23,12 @@ velkui::ui::SubViewP BuildControlsShowcase(velkui::pictel::Pictel& context,
                                            const std::u16string& title);
 
 // Draws two showcases side by side into `area` of `context`: the left one in
-// the theme's light colours, the right one in the dark control colours. The
-// theme's colours are restored afterwards. Needs an installed node manager
-// and theme; `area` should be at least 2 x kControlsShowcaseWidth + 24 wide
-// and kControlsShowcaseHeight high.
+// the theme's light colours, the right one in the dark interface (the
+// library's key-frame theme at brightness 0 when the installed theme takes
+// key frames, else the dark control colours). The theme's brightness and
+// colours are restored afterwards; a key-frame theme keeps the library's tracks. Needs an installed
+// node manager and theme; `area` should be at least 2 x kControlsShowcaseWidth + 24 wide and
+// kControlsShowcaseHeight high.
 void DrawControlsPage(velkui::pictel::Pictel& context, const velkcore::RectT<float>& area);
 
 }  // namespace gallery
