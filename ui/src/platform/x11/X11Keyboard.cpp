@@ -242,6 +242,7 @@ char16_t ControlCharacter(std::int16_t virtualKey) {
 }
 
 void AppendUTF32(std::u16string& text, char32_t c) {
+  if (c == 0) return;
   if (c >= 0x10000 && c <= 0x10FFFF) {
     c -= 0x10000;
     text.push_back(static_cast<char16_t>(0xD800 + (c >> 10)));

@@ -261,7 +261,7 @@ void X11Platform::Impl::Enqueue(QueuedMessage message) {
   queue.push_back(std::move(message));
 }
 
-void X11Platform::Impl::SyncModifiers(unsigned state) {
+void X11Platform::Impl::SyncModifiers(unsigned state, bool locks) {
   // The server's word wins over presses and releases we missed (while
   // another application had the focus, say).
   const auto sync = [this](bool held, std::int16_t left, std::int16_t right) {
@@ -275,8 +275,10 @@ void X11Platform::Impl::SyncModifiers(unsigned state) {
   };
   sync((state & ShiftMask) != 0, vk::kLeftShift, vk::kRightShift);
   sync((state & ControlMask) != 0, vk::kLeftControl, vk::kRightControl);
-  sync((state & Mod1Mask) != 0, vk::kLeftAlt, vk::kRightAlt);
+  // AltGr (the right Alt of most layouts) is Mod5, not Mod1.
+  sync((state & (Mod1Mask | Mod5Mask)) != 0, vk::kLeftAlt, vk::kRightAlt);
   SyncGenericModifiers(keys);
+  if (!locks) return;
   keys[vk::kCapsLock].toggled = (state & LockMask) != 0;
   if (keyboard.NumLockMask() != 0) {
     keys[vk::kNumLock].toggled = (state & keyboard.NumLockMask()) != 0;
@@ -287,11 +289,9 @@ void X11Platform::Impl::UpdateKeyState(const QueuedMessage& message) {
   const std::uint32_t msg = message.event.GetMsg();
   const bool isKey = msg >= kMsgKeyDown && msg <= kMsgSysKeyUp;
   if (message.modifierState) {
-    SyncModifiers(*message.modifierState);
-    // AltGr is no Mod1 key, but its side counts as held.
-    if (!isKey) {
-      keys[vk::kRightAlt].down = keys[vk::kRightAlt].down && keys[vk::kAlt].down;
-    }
+    const bool lockKey =
+        isKey && IsLockKey(static_cast<std::int16_t>(message.event.GetWParam() & 0xFFu));
+    SyncModifiers(*message.modifierState, !lockKey);
   }
   if (const std::int16_t button = ButtonVirtualKey(msg)) {
     keys[static_cast<std::size_t>(button)].down = !IsButtonUp(msg);
@@ -299,6 +299,11 @@ void X11Platform::Impl::UpdateKeyState(const QueuedMessage& message) {
   }
   if (!isKey) return;
   const bool down = msg == kMsgKeyDown || msg == kMsgSysKeyDown;
+  if (message.modifierState && down &&
+      IsLockKey(static_cast<std::int16_t>(message.event.GetWParam() & 0xFFu))) {
+    // The state before the press is the lock's state until now.
+    SyncModifiers(*message.modifierState, true);
+  }
   const KeyData data = GetKeyParam(message.event.GetLParam());
   const auto key = static_cast<std::size_t>(message.event.GetWParam() & 0xFFu);
   const auto side = static_cast<std::size_t>(message.sideKey & 0xFF);

@@ -163,7 +163,9 @@ struct X11Platform::Impl {
   void Post(PlatformWindow window, std::uint32_t message, std::uint64_t w = 0, std::int64_t l = 0);
   void Enqueue(x11::QueuedMessage message);
   void UpdateKeyState(const x11::QueuedMessage& message);
-  void SyncModifiers(unsigned state);
+  // `locks`: the lock keys too (not for a lock key's own messages, whose
+  // state may still show the lock it is about to change).
+  void SyncModifiers(unsigned state, bool locks);
   bool IsPaintable(const x11::WindowRecord& record) const;
   void Invalidate(x11::WindowRecord& record, const RectT<std::int32_t>* rect);
   void ApplyClientRect(x11::WindowRecord& record, const RectT<std::int32_t>& relative);
