@@ -62,6 +62,14 @@ X11Clipboard::~X11Clipboard() {
   XDestroyWindow(display_, window_);
 }
 
+bool X11Clipboard::Owns() {
+  if (owned_ && XGetSelectionOwner(display_, connection_.Atoms().clipboard) != window_) {
+    owned_ = false;
+    items_.clear();
+  }
+  return owned_;
+}
+
 Time X11Clipboard::ServerTime() {
   // A zero-length append to a property of our own window brings back the
   // server's time in its PropertyNotify.
@@ -94,7 +102,7 @@ void X11Clipboard::Set(std::vector<ClipboardItem> items) {
 }
 
 std::optional<std::string> X11Clipboard::Get(std::string_view type) {
-  if (owned_) {
+  if (Owns()) {
     for (const ClipboardItem& item : items_) {
       if (item.type == type) return item.bytes;
     }
@@ -117,7 +125,7 @@ std::optional<std::string> X11Clipboard::Get(std::string_view type) {
 
 std::vector<std::string> X11Clipboard::Types() {
   std::vector<std::string> types;
-  if (owned_) {
+  if (Owns()) {
     for (const ClipboardItem& item : items_) types.push_back(item.type);
     return types;
   }
@@ -336,6 +344,11 @@ std::optional<std::string> X11Clipboard::Convert(Atom target) {
   XEvent event;
   if (!WaitFor(SelectionNotify, None, event) || event.xselection.property == None) {
     return std::nullopt;
+  }
+  // The owner's own property changes (the INCR announcement) came before its
+  // answer: they must not pass for the first increment.
+  XEvent stale;
+  while (XCheckTypedWindowEvent(display_, window_, PropertyNotify, &stale)) {
   }
   std::optional<std::pair<Atom, std::string>> value = ReadProperty(atoms.selectionProperty, true);
   if (!value) return std::nullopt;

@@ -43,7 +43,8 @@ class X11Clipboard {
     std::size_t offset = 0;
   };
 
-  bool Owns() const { return owned_; }
+  // Asks the server: a SelectionClear not yet read must not leave old items.
+  bool Owns();
   Time ServerTime();
   void Serve(const XSelectionRequestEvent& request);
   std::optional<std::pair<Atom, std::string>> DataFor(Atom target) const;
