@@ -154,8 +154,9 @@ class UI_Node : public UI_NodeBase {
   // cached box goes stale and UI_Container::ChildGeometryChanged hears of it. The
   // sub-view setters call it; a class that overrides UI_IsShown,
   // UI_GetSelfToParentMatrix, UI_GetLocalRectF or UI_ReceivesEventsFromOS calls
-  // it whenever their answers change, and so does one that changes what its
-  // parent reads to lay it out (a sub-view's layout binding).
+  // it whenever their answers change. So should a setter of anything else a
+  // parent lays the node out from (an arrangement view reads a sub-view's
+  // layout binding), for the parent to hear of it at once.
   void UI_GeometryChanged() const;
 
   // ---- Identity and state ----
