@@ -59,7 +59,30 @@ X11Clipboard::X11Clipboard(const X11Connection& connection)
 }
 
 X11Clipboard::~X11Clipboard() {
+  HandOverToManager();
   XDestroyWindow(display_, window_);
+}
+
+void X11Clipboard::HandOverToManager() {
+  // What we own would go with the process: a clipboard manager keeps a copy
+  // (it asks for our targets while we wait for its answer).
+  const Atom manager = connection_.Intern("CLIPBOARD_MANAGER");
+  if (!Owns() || XGetSelectionOwner(display_, manager) == None) return;
+  XConvertSelection(display_, manager, connection_.Intern("SAVE_TARGETS"), None, window_,
+                    ServerTime());
+  XFlush(display_);
+  const auto deadline = std::chrono::steady_clock::now() + kAnswerTimeout;
+  while (std::chrono::steady_clock::now() < deadline) {
+    XEvent event;
+    if (XCheckTypedWindowEvent(display_, window_, SelectionNotify, &event)) return;
+    if (XCheckTypedEvent(display_, SelectionRequest, &event) ||
+        XCheckTypedEvent(display_, PropertyNotify, &event)) {
+      HandleEvent(event);
+      continue;
+    }
+    pollfd descriptor{connection_.FileDescriptor(), POLLIN, 0};
+    poll(&descriptor, 1, 20);
+  }
 }
 
 bool X11Clipboard::Owns() {

@@ -46,6 +46,7 @@ class X11Clipboard {
   // Asks the server: a SelectionClear not yet read must not leave old items.
   bool Owns();
   Time ServerTime();
+  void HandOverToManager();
   void Serve(const XSelectionRequestEvent& request);
   std::optional<std::pair<Atom, std::string>> DataFor(Atom target) const;
   std::vector<Atom> OfferedTargets() const;

@@ -160,10 +160,10 @@ X11Platform::Impl::Impl()
 
 X11Platform::Impl::~Impl() {
   if (capture != kNoPlatformWindow) XUngrabPointer(display, CurrentTime);
-  for (const PlatformWindow top : TopLevels()) {
-    XDestroyWindow(display, top);
-  }
+  // Surfaces and input contexts go before the windows they draw on.
+  const std::vector<PlatformWindow> tops = TopLevels();
   windows.clear();
+  for (const PlatformWindow top : tops) XDestroyWindow(display, top);
   XSync(display, False);
 }
 
@@ -964,9 +964,16 @@ void X11Platform::SetClientRect(PlatformWindow window, const RectT<std::int32_t>
     relative.left -= base.x;
     relative.top -= base.y;
   }
+  // Asking for the geometry the window has brings no answer to wait for.
+  const bool unchanged = relative == record->client;
   d.ApplyClientRect(*record, relative);
   const auto width = static_cast<unsigned>(std::max(relative.width, 1));
   const auto height = static_cast<unsigned>(std::max(relative.height, 1));
+  if (!record->child && !unchanged) {
+    // The server's answers to these requests are no news.
+    record->configureRequests.push_back(relative);
+    while (record->configureRequests.size() > 8) record->configureRequests.pop_front();
+  }
   if (!record->child && !record->overrideRedirect) {
     XSizeHints hints{};
     // Static gravity: the position asked for is the client area's, whatever the frame.
@@ -982,11 +989,8 @@ void X11Platform::SetClientRect(PlatformWindow window, const RectT<std::int32_t>
       hints.min_height = hints.max_height = static_cast<int>(height);
     }
     XSetWMNormalHints(d.display, window, &hints);
-    record->configureRequests.push_back(relative);
-    // Requests that never come back (a window manager that ignores them) are forgotten.
-    while (record->configureRequests.size() > 8) record->configureRequests.pop_front();
   }
-  XMoveResizeWindow(d.display, window, relative.left, relative.top, width, height);
+  if (!unchanged) XMoveResizeWindow(d.display, window, relative.left, relative.top, width, height);
   XFlush(d.display);
 }
 
