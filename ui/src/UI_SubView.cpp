@@ -215,7 +215,10 @@ void UI_SubView::UI_SetLayoutsChildren(bool layouts) {
 }
 
 void UI_SubView::UI_SetLayoutBinding(LayoutBinding binding) {
+  if (layoutBinding_ == binding) return;
   layoutBinding_ = binding;
+  // A parent that lays its children out reads the binding.
+  UI_GeometryChanged();
 }
 
 void UI_SubView::UI_SetSubViewLayoutFlags(velkcore::Flags<std::uint8_t> flags) {

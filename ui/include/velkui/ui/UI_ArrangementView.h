@@ -31,9 +31,8 @@ namespace velkui::ui {
 // its frame) is noticed as it happens, through ChildGeometryChanged, and the tree of groups is
 // arranged again at once. A change made while the tree is being arranged (a child that
 // resizes itself when it is placed) only marks it: the arrangement under way runs another pass
-// with what the child has become, and never re-enters itself. Changes that do not reach
-// UI_GeometryChanged (UI_SubView's binding setter does not report) are noticed when the child
-// is next placed, or by UpdateChildSizes.
+// with what the child has become, and never re-enters itself. Changes an override keeps from
+// UI_GeometryChanged are noticed when the child is next placed, or by UpdateChildSizes.
 class UI_ArrangementView : public UI_SubView, public arrange::DefaultGroup<arrange::DynamicGroup> {
  public:
   explicit UI_ArrangementView(
