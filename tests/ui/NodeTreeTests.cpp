@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <cmath>
+
 #include <velkcore/Error.h>
 #include <velkui/ui/UI_SubView.h>
 
@@ -260,6 +262,34 @@ TEST_F(LayoutTest, BindingsStretchMoveOrCentreChildren) {
   EXPECT_EQ(leftEdge->UI_GetLocalRectF(true), (RectT<float>{60, 10, -20, 50}));
   EXPECT_EQ(centred->UI_GetLocalRectF(true), (RectT<float>{60, 45, 30, 30}));
   EXPECT_EQ(fixed->UI_GetLocalRectF(true), (RectT<float>{10, 10, 30, 30}));
+}
+
+TEST_F(LayoutTest, AFrameSetByAHandlerDuringASizeChangeLaysChildrenOutOnce) {
+  // A view that keeps its width a multiple of 40, correcting itself from its own handler.
+  struct Snapping : UI_SubView {
+    void UI_SizeChanged(const RectT<float>& frame) override {
+      ++sizeChanges;
+      const float snapped = std::ceil(frame.width / 40) * 40;
+      if (snapped != frame.width) UI_SetLocalRectF({frame.left, frame.top, snapped, frame.height});
+    }
+    int sizeChanges = 0;
+  };
+  auto view = velkcore::MakeIntrusive<Snapping>();
+  view->UI_SetLocalRectF({0, 0, 80, 40});
+  view->UI_SetLayoutsChildren(true);
+  auto right = velkcore::MakeIntrusive<UI_SubView>();
+  right->UI_SetLocalRectF({50, 0, 20, 20});
+  right->UI_SetLayoutBinding(kBindLeftToRight | kBindRightToRight);
+  auto centred = velkcore::MakeIntrusive<UI_SubView>();
+  centred->UI_SetLocalRectF({30, 0, 20, 20});
+  centred->UI_SetLayoutBinding(kBindCenterHorizontally);
+  view->ChildPushBack(right);
+  view->ChildPushBack(centred);
+
+  view->UI_SetLocalRectF({0, 0, 90, 40});  // snaps to 120
+  EXPECT_EQ(view->UI_GetLocalRectF(true).width, 120.0f);
+  EXPECT_EQ(right->UI_GetLocalRectF(true), (RectT<float>{90, 0, 20, 20}));
+  EXPECT_EQ(centred->UI_GetLocalRectF(true), (RectT<float>{50, 0, 20, 20}));
 }
 
 TEST_F(LayoutTest, TheFirstRealSizingMovesNoChild) {

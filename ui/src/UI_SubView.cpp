@@ -70,13 +70,23 @@ void UI_SubView::UI_SetLocalRectF(const RectT<float>& rect) {
   UI_Invalidate(nullptr, InvalidateFlags{});
   const RectT<float> old = localRect_;
   localRect_ = rect;
-  UI_GeometryChanged();
-  UI_Invalidate(nullptr, InvalidateFlags{});
-  UI_SizeChanged(localRect_);
-  UI_DispatchNodeChange(NodeChange::kFrameChanged);
+  {
+    struct DepthGuard {
+      std::uint8_t& depth;
+      ~DepthGuard() { --depth; }
+    } guard{++frameChangeDepth_};
+    UI_GeometryChanged();
+    UI_Invalidate(nullptr, InvalidateFlags{});
+    UI_SizeChanged(localRect_);
+    UI_DispatchNodeChange(NodeChange::kFrameChanged);
+  }
+  // A frame set from inside this call (by a handler above) lays nothing out itself: the
+  // outermost call moves the children once, from the size before to the size now.
+  if (frameChangeDepth_ > 0) return;
+  const RectT<float> now = localRect_;
   if (viewFlags_.IsSet(kViewLayoutsChildren)) {
-    UI_LayoutChildren({old.width, old.height}, {rect.width, rect.height});
-  } else if (rect.width > 0.0f && rect.height > 0.0f) {
+    UI_LayoutChildren({old.width, old.height}, {now.width, now.height});
+  } else if (now.width > 0.0f && now.height > 0.0f) {
     viewFlags_.Set(kViewHasBeenSized);
   }
 }

@@ -67,6 +67,8 @@ class UI_SubView : public UI_Node {
   velkcore::RectT<float> localRect_;
   velkcore::ScaleMatrixT<float> matrix_;
   bool matrixOnlyForChildren_ = false;
+  // Frame changes under way on this node: a handler may set another frame from inside one.
+  std::uint8_t frameChangeDepth_ = 0;
   // The last area this node asked its parent to repaint, and when.
   std::uint64_t requestedSeed_ = 0;
   const UI_Node* requestedParent_ = nullptr;
