@@ -13,23 +13,48 @@ namespace velkui::ui::x11 {
 
 namespace {
 
+// Whether 32-bit ARGB in the host's byte order is how the server stores
+// pixels of this visual.
+bool IsNativeFormat(Display* display, Visual* visual, int depth) {
+  if (visual->c_class != TrueColor || (depth != 24 && depth != 32) ||
+      visual->red_mask != 0xFF0000u || visual->green_mask != 0xFF00u ||
+      visual->blue_mask != 0xFFu) {
+    return false;
+  }
+  const std::uint32_t probe = 1;
+  const bool hostLittleEndian = *reinterpret_cast<const unsigned char*>(&probe) == 1;
+  if ((ImageByteOrder(display) == LSBFirst) != hostLittleEndian) return false;
+  int count = 0;
+  XPixmapFormatValues* formats = XListPixmapFormats(display, &count);
+  bool bits32 = false;
+  for (int i = 0; i < count; ++i) {
+    if (formats[i].depth == depth) bits32 = formats[i].bits_per_pixel == 32;
+  }
+  if (formats != nullptr) XFree(formats);
+  return bits32;
+}
+
 std::uint8_t ToByte(float value) {
   return static_cast<std::uint8_t>(std::lround(std::clamp(value, 0.0f, 1.0f) * 255.0f));
 }
 
 }  // namespace
 
-X11BackBuffer::X11BackBuffer(Display* display, Window window, Visual* visual, std::int32_t width,
-                             std::int32_t height)
+X11BackBuffer::X11BackBuffer(Display* display, Window window, Visual* visual, int depth,
+                             std::int32_t width, std::int32_t height)
     : display_(display), window_(window), width_(std::max(width, 1)), height_(std::max(height, 1)) {
   target_ = cairo_xlib_surface_create(display_, window_, visual, width_, height_);
   if (cairo_surface_status(target_) != CAIRO_STATUS_SUCCESS) {
     cairo_surface_destroy(target_);
     throw std::bad_alloc();
   }
+  direct_ = IsNativeFormat(display_, visual, depth);
+  depth_ = depth;
+  if (direct_) gc_ = XCreateGC(display_, window_, 0, nullptr);
 }
 
 X11BackBuffer::~X11BackBuffer() {
+  if (gc_ != nullptr) XFreeGC(display_, gc_);
   if (image_ != nullptr) cairo_surface_destroy(image_);
   cairo_surface_destroy(target_);
 }
@@ -70,13 +95,40 @@ cairo_surface_t* X11BackBuffer::Image() {
 void X11BackBuffer::Present(const std::vector<velkcore::RectT<std::int32_t>>& rects) {
   if (image_ == nullptr || rects.empty()) return;
   cairo_surface_flush(image_);
+  const velkcore::RectT<std::int32_t> bounds{0, 0, cairo_image_surface_get_width(image_),
+                                             cairo_image_surface_get_height(image_)};
+  if (direct_) {
+    XImage image{};
+    image.width = bounds.width;
+    image.height = bounds.height;
+    image.format = ZPixmap;
+    image.data = reinterpret_cast<char*>(cairo_image_surface_get_data(image_));
+    image.byte_order = ImageByteOrder(display_);
+    image.bitmap_unit = 32;
+    image.bitmap_bit_order = BitmapBitOrder(display_);
+    image.bitmap_pad = 32;
+    image.depth = depth_;
+    image.bytes_per_line = cairo_image_surface_get_stride(image_);
+    image.bits_per_pixel = 32;
+    image.red_mask = 0xFF0000u;
+    image.green_mask = 0xFF00u;
+    image.blue_mask = 0xFFu;
+    if (XInitImage(&image) == 0) return;
+    for (const velkcore::RectT<std::int32_t>& rect : rects) {
+      const velkcore::RectT<std::int32_t> r = velkcore::Intersection(rect, bounds);
+      if (r.IsEmpty()) continue;
+      XPutImage(display_, window_, gc_, &image, r.left, r.top, r.left, r.top,
+                static_cast<unsigned>(r.width), static_cast<unsigned>(r.height));
+    }
+    return;
+  }
   cairo_t* cr = cairo_create(target_);
-  for (const velkcore::RectT<std::int32_t>& r : rects)
-    cairo_rectangle(cr, r.left, r.top, r.width, r.height);
-  cairo_clip(cr);
   cairo_set_operator(cr, CAIRO_OPERATOR_SOURCE);
   cairo_set_source_surface(cr, image_, 0, 0);
-  cairo_paint(cr);
+  for (const velkcore::RectT<std::int32_t>& r : rects) {
+    cairo_rectangle(cr, r.left, r.top, r.width, r.height);
+  }
+  cairo_fill(cr);
   cairo_destroy(cr);
   cairo_surface_flush(target_);
 }

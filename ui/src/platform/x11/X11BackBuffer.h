@@ -13,11 +13,15 @@
 namespace velkui::ui::x11 {
 
 // A window's pixels: the library paints into an image of the client area's
-// size, and only the painted rectangles go to the window (through cairo-xlib).
-// The image also answers exposures without a repaint.
+// size, and only the painted rectangles go to the window. On the usual 24-bit
+// true-colour visuals the image's bytes are already the server's pixel format
+// and go with XPutImage; other visuals go through cairo-xlib, which converts.
+// (cairo-xlib's shared-memory uploads lose track of a few bytes at the end,
+// so the plain path avoids them.) The image also answers exposures without a
+// repaint.
 class X11BackBuffer {
  public:
-  X11BackBuffer(Display* display, Window window, Visual* visual, std::int32_t width,
+  X11BackBuffer(Display* display, Window window, Visual* visual, int depth, std::int32_t width,
                 std::int32_t height);
   ~X11BackBuffer();
   X11BackBuffer(const X11BackBuffer&) = delete;
@@ -45,6 +49,10 @@ class X11BackBuffer {
   std::int32_t height_;
   cairo_surface_t* image_ = nullptr;
   cairo_surface_t* target_ = nullptr;
+  // The XPutImage path: the image's bytes are the server's format.
+  bool direct_ = false;
+  int depth_ = 24;
+  GC gc_ = nullptr;
   bool complete_ = false;
   bool shaped_ = false;
 };

@@ -671,8 +671,8 @@ PlatformWindow X11Platform::CreateWindow(const WindowCreateParams& params) {
                                       &attributes);
   record.handle = window;
   record.buffer = std::make_unique<x11::X11BackBuffer>(
-      d.display, window, DefaultVisual(d.display, d.connection.Screen()), record.client.width,
-      record.client.height);
+      d.display, window, DefaultVisual(d.display, d.connection.Screen()),
+      DefaultDepth(d.display, d.connection.Screen()), record.client.width, record.client.height);
 
   if (managed) {
     XClassHint classHint{const_cast<char*>("velkui"), const_cast<char*>("Velkui")};
