@@ -247,16 +247,6 @@ TEST_F(DialogKeyTest, AFieldBeingEditedGivesUpReturnUnlessItKeepsIt) {
   session.GetNodeManager().SetTextEditControlHasFocus(false);
 }
 
-TEST_F(DialogKeyTest, ADisabledOkButtonMakesReturnDoNothing) {
-  auto dialog = MakeDialog(main.get());
-  auto ok = AddButton(*dialog, u"OK", {120, 120, 80, 24});
-  dialog->SetOkButton(ok);
-  ok->SetDisabled(true);
-  RunTyping(*dialog, {vk::kReturn});
-  EXPECT_FALSE(dialog->IsClosing());
-  EXPECT_EQ(dialog->GetResponse(), UI_Dialog::kCancel);
-}
-
 TEST_F(DialogKeyTest, ButtonsThatOutliveTheirDialogNoLongerReachIt) {
   boost::intrusive_ptr<controls::UI_TextButton> ok;
   {

@@ -167,22 +167,6 @@ TEST_F(DialogModalTest, AHandlerThatThrowsStillEndsTheRun) {
   headless.ProcessEvents();  // what the throw left in the queue
 }
 
-TEST_F(DialogModalTest, ARunningDialogCannotRunAgain) {
-  auto dialog = MakeDialog(main.get());
-  bool threw = false;
-  dialog->during = [&] {
-    try {
-      dialog->RunModal();
-    } catch (const velkcore::Exception&) {
-      threw = true;
-    }
-    EXPECT_TRUE(dialog->IsModal());
-  };
-  dialog->RunModal();
-  EXPECT_TRUE(threw);
-  EXPECT_FALSE(dialog->IsModal());
-}
-
 TEST_F(DialogModalTest, AHostCanDriveTheRunItself) {
   auto other = MakeWindow({950, 100, 200, 200}, kStyleOverlappedWindow);
   auto dialog = MakeDialog(main.get());

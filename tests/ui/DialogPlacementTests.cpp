@@ -107,17 +107,5 @@ TEST_F(DialogPlacementTest, AStoredPlaceOffTheMonitorsIsBroughtBack) {
   EXPECT_EQ(frame.height, 186);
 }
 
-TEST_F(DialogPlacementTest, ACallbackThatKeepsTheDialogOpenStillSavesThePlace) {
-  auto dialog = Named("FindDialog");
-  dialog->SetPostCloseCallback([](UI_Dialog::Response) { return true; });
-  dialog->UI_Move({123, 145});
-  CloseWith(*dialog, vk::kReturn);
-  EXPECT_FALSE(dialog->IsClosing());
-  RectT<std::int32_t> stored;
-  ASSERT_TRUE(PrefManager::GetPrefManager()->GetWindowPosition(u"FindDialog", stored));
-  EXPECT_EQ(stored.left, 123);
-  EXPECT_EQ(stored.top, 145);
-}
-
 }  // namespace
 }  // namespace velkui::ui::test

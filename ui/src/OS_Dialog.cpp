@@ -191,15 +191,13 @@ void OS_Dialog::EndModal() {
 }
 
 void OS_Dialog::BlockOtherWindows() {
-  const PlatformWindow own = GetPlatformWindow(false);
   for (OS_Window* window : UI_EnumerateAllWindows()) {
     const PlatformWindow handle = window->GetPlatformWindow(false);
-    if (window == this || handle == kNoPlatformWindow || window->IsEmbedded() ||
-        (window->GetStyle() & kStyleChild) != 0 ||
-        (window->GetExStyle() & kExStyleNoActivate) != 0 || IsOwnedBy(*window, this) ||
-        handle == own || window->UI_IsDisabled()) {
-      continue;
-    }
+    const bool blocks = window != this && handle != kNoPlatformWindow && !window->IsEmbedded() &&
+                        (window->GetStyle() & kStyleChild) == 0 &&
+                        (window->GetExStyle() & kExStyleNoActivate) == 0 &&
+                        !IsOwnedBy(*window, this) && !window->UI_IsDisabled();
+    if (!blocks) continue;
     blocked_.push_back({handle, window});
     const NodeP keepWindow = detail::Hold(window);
     window->UI_SetDisabled(true);
