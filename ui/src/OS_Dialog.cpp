@@ -181,12 +181,17 @@ PumpResult OS_Dialog::ModalLoop() {
 void OS_Dialog::EndModal() {
   if (!modal_) return;
   const NodeP keep = detail::Hold(this);
-  // Whatever fails below, the run is over and the blocked windows come back.
+  // Whatever fails below, the run is over and the modal-window role goes.
   modal_ = false;
-  UnblockWindows();
-  if (ActivatesWindowOnBeginModal()) ReactivatePreviousWindow();
-  previousActive_ = kNoPlatformWindow;
-  OS_Window::UI_Show(false);
+  try {
+    UnblockWindows();
+    if (ActivatesWindowOnBeginModal()) ReactivatePreviousWindow();
+    previousActive_ = kNoPlatformWindow;
+    OS_Window::UI_Show(false);
+  } catch (...) {
+    modalGuard_.reset();
+    throw;
+  }
   modalGuard_.reset();
 }
 
