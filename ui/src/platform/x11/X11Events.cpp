@@ -301,18 +301,18 @@ void X11Platform::Impl::HandleConfigure(const XConfigureEvent& event) {
   }
 }
 
-void X11Platform::Impl::ReadFrameExtents(WindowRecord& record) {
+void X11Platform::Impl::ReadFrameExtentsOf(Window window, x11::Insets& frame) {
   Atom type = None;
   int format = 0;
   unsigned long count = 0;
   unsigned long after = 0;
   unsigned char* data = nullptr;
-  if (XGetWindowProperty(display, record.handle, connection.Atoms().netFrameExtents, 0, 4, False,
+  if (XGetWindowProperty(display, window, connection.Atoms().netFrameExtents, 0, 4, False,
                          XA_CARDINAL, &type, &format, &count, &after, &data) == Success &&
       data != nullptr && format == 32 && count == 4) {
     const auto* values = reinterpret_cast<const long*>(data);
-    record.frame = {static_cast<std::int32_t>(values[0]), static_cast<std::int32_t>(values[1]),
-                    static_cast<std::int32_t>(values[2]), static_cast<std::int32_t>(values[3])};
+    frame = {static_cast<std::int32_t>(values[0]), static_cast<std::int32_t>(values[1]),
+             static_cast<std::int32_t>(values[2]), static_cast<std::int32_t>(values[3])};
   }
   if (data != nullptr) XFree(data);
 }
@@ -348,7 +348,7 @@ void X11Platform::Impl::HandleProperty(const XPropertyEvent& event) {
   }
   WindowRecord* record = Find(event.window);
   if (record == nullptr) return;
-  if (event.atom == atoms.netFrameExtents) ReadFrameExtents(*record);
+  if (event.atom == atoms.netFrameExtents) ReadFrameExtentsOf(record->handle, record->frame);
   if (event.atom == atoms.wmState) ReadWindowState(*record);
 }
 

@@ -125,6 +125,17 @@ void SyncGenericModifiers(std::array<KeyState, 256>& keys) {
   keys[vk::kAlt].down = keys[vk::kLeftAlt].down || keys[vk::kRightAlt].down;
 }
 
+struct PropertyOfWindow {
+  Window window;
+  Atom property;
+};
+
+Bool IsPropertyChangeOf(Display*, XEvent* event, XPointer argument) {
+  const auto* wanted = reinterpret_cast<const PropertyOfWindow*>(argument);
+  return event->type == PropertyNotify && event->xproperty.window == wanted->window &&
+         event->xproperty.atom == wanted->property;
+}
+
 }  // namespace
 
 // ---- Impl: records ----
@@ -347,6 +358,14 @@ void X11Platform::Impl::ApplyClientRect(WindowRecord& record, const RectT<std::i
   Invalidate(record, nullptr);
 }
 
+bool X11Platform::Impl::HasMessage() {
+  if (!queue.empty() || quitPending) return true;
+  const std::optional<double> due = timers.NextDue();
+  if (due && *due <= Now()) return true;
+  return std::any_of(windows.begin(), windows.end(),
+                     [this](const auto& entry) { return IsPaintable(entry.second); });
+}
+
 bool X11Platform::Impl::Wait(double seconds) {
   XFlush(display);
   if (XEventsQueued(display, QueuedAlready) > 0) return true;
@@ -454,6 +473,23 @@ void X11Platform::Impl::LoseCapture() {
   if (Find(old) != nullptr) Post(old, kMsgCaptureLost);
 }
 
+bool X11Platform::Impl::WaitForFrameExtents(Window window) {
+  PropertyOfWindow wanted{window, connection.Atoms().netFrameExtents};
+  const auto deadline = std::chrono::steady_clock::now() + std::chrono::milliseconds(200);
+  XFlush(display);
+  for (;;) {
+    XEvent event;
+    if (XCheckIfEvent(display, &event, IsPropertyChangeOf, reinterpret_cast<XPointer>(&wanted))) {
+      return true;
+    }
+    const auto left = std::chrono::duration_cast<std::chrono::milliseconds>(
+        deadline - std::chrono::steady_clock::now());
+    if (left.count() <= 0) return false;
+    pollfd descriptor{connection.FileDescriptor(), POLLIN, 0};
+    poll(&descriptor, 1, static_cast<int>(left.count()));
+  }
+}
+
 // ---- Impl: pointer ----
 
 PlatformWindow X11Platform::Impl::WindowAtScreen(const PointT<std::int32_t>& point) const {
@@ -537,13 +573,19 @@ std::string_view X11Platform::GetName() const {
 bool X11Platform::WaitForActivity(double seconds) {
   velkcore::RequireInput(std::isfinite(seconds) && seconds >= 0.0);
   Impl& d = *impl_;
-  d.DrainConnection();
-  if (!d.queue.empty()) return true;
-  double limit = seconds;
-  if (const std::optional<double> due = d.timers.NextDue()) {
-    limit = std::min(limit, std::max(0.0, *due - d.Now()));
+  const double end = d.Now() + seconds;
+  for (;;) {
+    // X events that make no message (a property change, say) wake the wait
+    // but do not end it.
+    d.DrainConnection();
+    if (d.HasMessage()) return true;
+    double limit = end - d.Now();
+    if (limit <= 0) return false;
+    if (const std::optional<double> due = d.timers.NextDue()) {
+      limit = std::min(limit, std::max(0.0, *due - d.Now()));
+    }
+    d.Wait(limit);
   }
-  return d.Wait(limit);
 }
 
 void X11Platform::Sync() {
@@ -724,8 +766,9 @@ PlatformWindow X11Platform::CreateWindow(const WindowCreateParams& params) {
       XSelectInput(d.display, window,
                    kTopLevelEvents | x11::X11Keyboard::FilterEvents(record.inputContext.get()));
     }
-    if (d.connection.HasWindowManager()) {
-      // Ask now what frame the window will get.
+    if (d.connection.HasWindowManager() && HasCaption(params.style)) {
+      // Ask now what frame the window will get, so that the frame asked for is
+      // the frame it gets.
       XEvent request{};
       request.xclient.type = ClientMessage;
       request.xclient.window = window;
@@ -733,6 +776,9 @@ PlatformWindow X11Platform::CreateWindow(const WindowCreateParams& params) {
       request.xclient.format = 32;
       XSendEvent(d.display, d.connection.Root(), False,
                  SubstructureNotifyMask | SubstructureRedirectMask, &request);
+      if (d.WaitForFrameExtents(window)) {
+        d.ReadFrameExtentsOf(window, record.frame);
+      }
     }
   } else if (record.overrideRedirect) {
     SetAtomProperty(d.display, window, atoms.netWmWindowType, XA_ATOM,
@@ -742,8 +788,12 @@ PlatformWindow X11Platform::CreateWindow(const WindowCreateParams& params) {
   WindowRecord& stored = *d.Find(window);
   SetWindowTitle(window, params.title);
   if (managed) {
-    // Size hints and placement: the client area goes where it was asked.
-    SetClientRect(window, stored.client);
+    // Size hints and placement: the client area goes where it was asked,
+    // inside the frame the window manager announced.
+    const Insets& f = stored.frame;
+    SetClientRect(window, {params.frame.left + f.left, params.frame.top + f.top,
+                           std::max(0, params.frame.width - f.left - f.right),
+                           std::max(0, params.frame.height - f.top - f.bottom)});
   }
   d.Invalidate(stored, nullptr);
   if ((params.style & kStyleVisible) != 0) ShowWindow(window, true, false);

@@ -169,6 +169,8 @@ struct X11Platform::Impl {
   bool IsPaintable(const x11::WindowRecord& record) const;
   void Invalidate(x11::WindowRecord& record, const RectT<std::int32_t>* rect);
   void ApplyClientRect(x11::WindowRecord& record, const RectT<std::int32_t>& relative);
+  // Whether GetNextEvent would hand something out now.
+  bool HasMessage();
   // Sleeps in poll() until the connection has data or `seconds` pass (< 0: no limit).
   bool Wait(double seconds);
 
@@ -204,7 +206,10 @@ struct X11Platform::Impl {
   void HandleClientMessage(const XClientMessageEvent& event);
   void ReconcileFocus();
   void DisplayChanged();
-  void ReadFrameExtents(x11::WindowRecord& record);
+  void ReadFrameExtentsOf(Window window, x11::Insets& frame);
+  // Waits a little for the window manager's answer to _NET_REQUEST_FRAME_EXTENTS
+  // (other events stay queued).
+  bool WaitForFrameExtents(Window window);
   void ReadWindowState(x11::WindowRecord& record);
 };
 
