@@ -326,5 +326,35 @@ TEST_F(X11InputTest, KeysWithoutAKeyOnThisKeyboardAreAnError) {
   }
 }
 
+TEST_F(X11InputTest, DisabledWindowsGetNoInputAndADestroyedWindowsMessagesAreDropped) {
+  const PlatformWindow window = CreateRaw({200, 200, 120, 80});
+  MoveTo(window, 20, 20);
+  Drain();
+  x11.EnableWindow(window, false);
+  x11.InjectButton(1, true);
+  x11.InjectButton(1, false);
+  TypeKey('K');
+  EXPECT_TRUE(Messages(Drain(), true).empty());
+  x11.EnableWindow(window, true);
+  x11.InjectButton(1, true);
+  x11.InjectButton(1, false);
+  EXPECT_EQ(Messages(Drain()), (std::vector<std::uint32_t>{kMsgLeftButtonDown, kMsgLeftButtonUp}));
+  // A capture ends when its window is disabled.
+  x11.SetCapture(window);
+  x11.EnableWindow(window, false);
+  EXPECT_EQ(x11.GetCapture(), kNoPlatformWindow);
+  EXPECT_EQ(Messages(Drain()), (std::vector<std::uint32_t>{kMsgCaptureLost}));
+  x11.EnableWindow(window, true);
+
+  TypeKey('K');
+  x11.SetTimer(window, 3, 10);
+  x11.Sync();
+  x11.DestroyWindow(window);
+  EXPECT_FALSE(x11.IsWindow(window));
+  EXPECT_EQ(x11.GetActiveWindow(), kNoPlatformWindow);
+  EXPECT_EQ(x11.GetFocus(), kNoPlatformWindow);
+  for (const OS_Event& event : Drain()) EXPECT_NE(event.GetWindow(), window) << event.GetMsg();
+}
+
 }  // namespace
 }  // namespace velkui::ui::x11test
