@@ -50,5 +50,6 @@ function(velkui_embed_resources target function dir)
   endif()
   file(CONFIGURE OUTPUT "${out}" CONTENT "${content}" @ONLY)
   target_sources(${target} PRIVATE "${out}")
-  set_source_files_properties("${out}" PROPERTIES OBJECT_DEPENDS "${files}")
+  # The target may live in another directory than this call: set the dependency where it is.
+  set_source_files_properties("${out}" TARGET_DIRECTORY ${target} PROPERTIES OBJECT_DEPENDS "${files}")
 endfunction()

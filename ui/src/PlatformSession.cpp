@@ -3,6 +3,7 @@
 #include <velkcore/Error.h>
 #include <velkui/pictel/ColorManagement.h>
 #include <velkui/pictel/StartupShutdownGdiPlus.h>
+#include <velkui/ui/DefaultKeyframeTheme.h>
 #include <velkui/ui/KeyframeThemeEditor.h>
 #include <velkui/ui/Theme.h>
 
@@ -17,7 +18,10 @@ PlatformSession::PlatformSession(std::unique_ptr<Platform> platform)
   try {
     graphics_ = std::make_unique<utility::StartupShutdownGdiPlus>();
     if (!Theme::IsInitialized()) {
-      Theme::Initialize(std::make_unique<KeyframeThemeEditor>());
+      // With the library's key frames, SetBrightness gives the dark look out of the box.
+      auto theme = std::make_unique<KeyframeThemeEditor>();
+      LoadDefaultKeyframeTheme(*theme);
+      Theme::Initialize(std::move(theme));
       ownsTheme_ = true;
     }
     manager_ = std::make_unique<OS_NodeManager>();
