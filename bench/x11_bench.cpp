@@ -29,7 +29,7 @@
 #include <velkui/ui/PlatformSession.h>
 #include <velkui/ui/UI_SubView.h>
 
-#include "../ui/src/platform/x11/X11Platform.h"
+#include "X11Platform.h"
 
 namespace {
 
