@@ -377,7 +377,15 @@ void X11Platform::Impl::ReconcileFocus() {
   if (top != kNoPlatformWindow) {
     const WindowRecord* record = Find(top);
     if (top != active && record->visible && (record->exStyle & kExStyleNoActivate) == 0) {
-      Activate(top, false, false);
+      // A window blocked by a modal run (the user clicked it, and the window
+      // manager focused it) hands the activation, and the server's focus, to
+      // the window that is in use.
+      const PlatformWindow usable = record->enabled ? top : UsableWindowInsteadOf(top);
+      if (usable == kNoPlatformWindow || usable == top) {
+        Activate(top, false, false);
+      } else {
+        Activate(usable, false, true);
+      }
     }
     return;
   }

@@ -368,10 +368,10 @@ std::u16string X11Keyboard::TextOf(XKeyEvent& event, XIC context, const KeyIdent
   return text;
 }
 
-std::optional<KeyCode> X11Keyboard::KeycodeFor(std::int16_t virtualKey, bool extended,
-                                               bool numLockOn) const {
+std::optional<KeyCode> KeycodeOfVirtualKey(Display* display, std::int16_t virtualKey, bool extended,
+                                           bool numLockOn) {
   for (const KeySym keysym : KeysymsOf(virtualKey, extended, numLockOn)) {
-    const KeyCode code = XKeysymToKeycode(display_, keysym);
+    const KeyCode code = XKeysymToKeycode(display, keysym);
     if (code != 0) return code;
   }
   return std::nullopt;

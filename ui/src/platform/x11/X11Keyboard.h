@@ -40,8 +40,6 @@ class X11Keyboard {
   // The text a key press types, in UTF-16 (control characters included, as
   // the desktop produces them: Ctrl+A is 1, Return 13).
   std::u16string TextOf(XKeyEvent& event, XIC context, const KeyIdentity& key) const;
-  // The keycode that makes `virtualKey`, if this keyboard has one.
-  std::optional<KeyCode> KeycodeFor(std::int16_t virtualKey, bool extended, bool numLockOn) const;
 
   // The modifier bit of Num Lock (it varies between keymaps).
   unsigned NumLockMask() const { return numLockMask_; }
@@ -55,6 +53,10 @@ class X11Keyboard {
   XIM inputMethod_ = nullptr;
   unsigned numLockMask_ = Mod2Mask;
 };
+
+// The keycode that makes `virtualKey` on the keyboard of `display`, if it has one.
+std::optional<KeyCode> KeycodeOfVirtualKey(Display* display, std::int16_t virtualKey, bool extended,
+                                           bool numLockOn);
 
 // Printable characters only (letters in upper case); 0 for the others.
 char16_t UnshiftedCharacterOfVirtualKey(std::int16_t virtualKey);

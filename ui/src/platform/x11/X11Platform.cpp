@@ -32,13 +32,6 @@ namespace {
 
 // More separate pending rectangles than this are merged into their bounds.
 constexpr std::size_t kMaxPendingRects = 16;
-constexpr std::string_view kNoKeyKey =
-    "$$$/velkui/ui/Error/NoKeyForVirtualKey=No key of this keyboard makes the virtual key ^0.";
-constexpr std::int32_t kNoKeyNumber = 60;
-constexpr std::string_view kNoSyntheticInputKey =
-    "$$$/velkui/ui/Error/NoSyntheticInput=Synthetic input is not available on this display (the "
-    "XTEST extension is missing).";
-constexpr std::int32_t kNoSyntheticInputNumber = 62;
 
 constexpr long kTopLevelEvents = ExposureMask | StructureNotifyMask | PropertyChangeMask |
                                  FocusChangeMask | ButtonPressMask | ButtonReleaseMask |
@@ -123,6 +116,33 @@ void SyncGenericModifiers(std::array<KeyState, 256>& keys) {
   keys[vk::kShift].down = keys[vk::kLeftShift].down || keys[vk::kRightShift].down;
   keys[vk::kControl].down = keys[vk::kLeftControl].down || keys[vk::kRightControl].down;
   keys[vk::kAlt].down = keys[vk::kLeftAlt].down || keys[vk::kRightAlt].down;
+}
+
+// A window with a modal frame and an owner: a dialog the window manager keeps
+// above its owner.
+bool IsModalFrame(const WindowRecord& record) {
+  return record.parent != kNoPlatformWindow &&
+         ((record.exStyle & kExStyleModalFrame) != 0 || (record.style & kStyleModalFrame) != 0);
+}
+
+// _NET_WM_STATE as a managed window asks for it before it is mapped. A window
+// manager removes the property when the window is withdrawn, so every map
+// writes it again.
+void WriteInitialStates(Display* display, const x11::X11Atoms& atoms, Window window,
+                        const WindowRecord& record) {
+  std::vector<long> states;
+  if (IsModalFrame(record)) states.push_back(static_cast<long>(atoms.netWmStateModal));
+  if ((record.exStyle & kExStyleTopmost) != 0) {
+    states.push_back(static_cast<long>(atoms.netWmStateAbove));
+  }
+  if ((record.exStyle & kExStyleToolWindow) != 0) {
+    states.push_back(static_cast<long>(atoms.netWmStateSkipTaskbar));
+  }
+  if (states.empty()) {
+    XDeleteProperty(display, window, atoms.netWmState);
+  } else {
+    SetAtomProperty(display, window, atoms.netWmState, XA_ATOM, states);
+  }
 }
 
 struct PropertyOfWindow {
@@ -447,6 +467,17 @@ void X11Platform::Impl::ActivateNextAfter(PlatformWindow leaving) {
   }
 }
 
+PlatformWindow X11Platform::Impl::UsableWindowInsteadOf(PlatformWindow blocked) const {
+  for (auto it = activationOrder.rbegin(); it != activationOrder.rend(); ++it) {
+    const WindowRecord* record = Find(*it);
+    if (*it != blocked && record != nullptr && record->visible && !record->minimized &&
+        record->enabled && (record->exStyle & kExStyleNoActivate) == 0) {
+      return *it;
+    }
+  }
+  return kNoPlatformWindow;
+}
+
 void X11Platform::Impl::DeactivateApplication() {
   if (capture != kNoPlatformWindow) LoseCapture();
   const PlatformWindow old = active;
@@ -653,6 +684,10 @@ bool X11Platform::HasWindowManager() const {
   return impl_->connection.HasWindowManager();
 }
 
+std::string X11Platform::GetDisplayName() const {
+  return DisplayString(impl_->display);
+}
+
 std::int32_t X11Platform::GetPaintCount(PlatformWindow window) const {
   const WindowRecord* record = impl_->Find(window);
   return record != nullptr ? record->paintCount : 0;
@@ -746,21 +781,11 @@ PlatformWindow X11Platform::CreateWindow(const WindowCreateParams& params) {
     }
     SetAtomProperty(d.display, window, atoms.motifWmHints, atoms.motifWmHints,
                     {kMotifFunctions | kMotifDecorations, functions, decorations, 0, 0});
-    const bool modal =
-        params.parent != kNoPlatformWindow &&
-        ((params.exStyle & kExStyleModalFrame) != 0 || (params.style & kStyleModalFrame) != 0);
     const Atom type = (params.exStyle & kExStyleToolWindow) != 0 ? atoms.netWmWindowTypeUtility
-                      : modal                                    ? atoms.netWmWindowTypeDialog
+                      : IsModalFrame(record)                     ? atoms.netWmWindowTypeDialog
                                                                  : atoms.netWmWindowTypeNormal;
     SetAtomProperty(d.display, window, atoms.netWmWindowType, XA_ATOM, {static_cast<long>(type)});
-    std::vector<long> states;
-    if (modal) states.push_back(static_cast<long>(atoms.netWmStateModal));
-    if ((params.exStyle & kExStyleTopmost) != 0)
-      states.push_back(static_cast<long>(atoms.netWmStateAbove));
-    if ((params.exStyle & kExStyleToolWindow) != 0) {
-      states.push_back(static_cast<long>(atoms.netWmStateSkipTaskbar));
-    }
-    if (!states.empty()) SetAtomProperty(d.display, window, atoms.netWmState, XA_ATOM, states);
+    WriteInitialStates(d.display, atoms, window, record);
     record.inputContext.reset(d.keyboard.CreateContext(window));
     if (record.inputContext) {
       XSelectInput(d.display, window,
@@ -860,9 +885,12 @@ void X11Platform::ShowWindow(PlatformWindow window, bool show, bool activate) {
   if (record->visible != show) {
     record->visible = show;
     if (show) {
-      if (!record->child && !record->overrideRedirect && !activate) {
+      if (!record->child && !record->overrideRedirect) {
+        WriteInitialStates(d.display, d.connection.Atoms(), window, *record);
         // Shown without being activated: a user time of 0 tells the window manager.
-        SetAtomProperty(d.display, window, d.connection.Atoms().netWmUserTime, XA_CARDINAL, {0});
+        if (!activate) {
+          SetAtomProperty(d.display, window, d.connection.Atoms().netWmUserTime, XA_CARDINAL, {0});
+        }
       }
       if (!record->minimized) {
         if (record->child) {
@@ -1310,7 +1338,19 @@ std::vector<std::string> X11Platform::GetClipboardTypes() const {
 
 // ---- Synthetic input ----
 
+namespace x11 {
+
 namespace {
+
+constexpr std::string_view kNoKeyKey =
+    "$$$/velkui/ui/Error/NoKeyForVirtualKey=No key of this keyboard makes the virtual key ^0.";
+constexpr std::int32_t kNoKeyNumber = 60;
+constexpr std::string_view kNoSyntheticInputKey =
+    "$$$/velkui/ui/Error/NoSyntheticInput=Synthetic input is not available on this display (the "
+    "XTEST extension is missing).";
+constexpr std::int32_t kNoSyntheticInputNumber = 62;
+
+}  // namespace
 
 void RequireSyntheticInput(bool available) {
   if (!available) {
@@ -1319,7 +1359,18 @@ void RequireSyntheticInput(bool available) {
   }
 }
 
-}  // namespace
+KeyCode RequireKeycode(Display* display, std::int16_t virtualKey, bool extended, bool numLockOn) {
+  const std::optional<KeyCode> code = KeycodeOfVirtualKey(display, virtualKey, extended, numLockOn);
+  if (!code) {
+    velkcore::ThrowError(velkcore::ErrorLevel::kError, kNoKeyKey, velkcore::kCategoryUserInterface,
+                         kNoKeyNumber, 0, static_cast<std::int32_t>(virtualKey));
+  }
+  return *code;
+}
+
+}  // namespace x11
+
+using x11::RequireSyntheticInput;
 
 void X11Platform::InjectPointerMove(const PointT<std::int32_t>& screenPoint) {
   Impl& d = *impl_;
@@ -1357,13 +1408,9 @@ void X11Platform::InjectKey(std::int16_t virtualKey, bool extended, bool down) {
   velkcore::RequireInput(virtualKey > 0 && virtualKey < 256);
   Impl& d = *impl_;
   RequireSyntheticInput(d.xtestAvailable);
-  const std::optional<KeyCode> code =
-      d.keyboard.KeycodeFor(virtualKey, extended, d.keys[vk::kNumLock].toggled);
-  if (!code) {
-    velkcore::ThrowError(velkcore::ErrorLevel::kError, kNoKeyKey, velkcore::kCategoryUserInterface,
-                         kNoKeyNumber, 0, static_cast<std::int32_t>(virtualKey));
-  }
-  XTestFakeKeyEvent(d.display, *code, down ? True : False, CurrentTime);
+  const KeyCode code =
+      x11::RequireKeycode(d.display, virtualKey, extended, d.keys[vk::kNumLock].toggled);
+  XTestFakeKeyEvent(d.display, code, down ? True : False, CurrentTime);
   XSync(d.display, False);
 }
 

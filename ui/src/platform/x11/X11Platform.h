@@ -1,6 +1,7 @@
 #pragma once
 
 #include <memory>
+#include <string>
 
 #include <boost/intrusive_ptr.hpp>
 
@@ -45,6 +46,8 @@ class X11Platform : public Platform {
   // window manager or the user would: the change comes back as kMsgSize/kMsgMove.
   void ResizeFromOutside(PlatformWindow window, const velkcore::RectT<std::int32_t>& client);
   bool HasWindowManager() const;
+  // The display the backend is connected to (":90", say).
+  std::string GetDisplayName() const;
   std::int32_t GetPaintCount(PlatformWindow window) const;
 
   // ---- Platform ----

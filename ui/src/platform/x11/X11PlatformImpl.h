@@ -85,6 +85,12 @@ struct QueuedMessage {
   std::optional<unsigned> modifierState;
 };
 
+// The "no synthetic input" error (103/62) when XTest is missing.
+void RequireSyntheticInput(bool available);
+// The keycode of a virtual key on `display`'s keyboard; the "no key for
+// this virtual key" error (103/60) when it has none.
+KeyCode RequireKeycode(Display* display, std::int16_t virtualKey, bool extended, bool numLockOn);
+
 }  // namespace velkui::ui::x11
 
 namespace velkui::ui {
@@ -178,6 +184,10 @@ struct X11Platform::Impl {
   void SetFocus(PlatformWindow handle);
   void Activate(PlatformWindow handle, bool byClick, bool askServer);
   void ActivateNextAfter(PlatformWindow leaving);
+  // The window that takes the activation a disabled (blocked) top-level
+  // window was given from outside: the latest active top-level window that
+  // is usable. kNoPlatformWindow when there is none.
+  PlatformWindow UsableWindowInsteadOf(PlatformWindow blocked) const;
   void DeactivateApplication();
   void PostLeaveIfTracked(PlatformWindow handle);
   void LoseCapture();
