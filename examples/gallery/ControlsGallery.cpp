@@ -131,7 +131,8 @@ boost::intrusive_ptr<controls::UI_OwnerDrawButton> Swatch() {
 }  // namespace
 
 velkui::ui::SubViewP BuildControlsShowcase(velkui::pictel::Pictel& context,
-                                           const std::u16string& title) {
+                                           const std::u16string& title,
+                                           const std::u16string& footer) {
   ui::UI_NodeManager& manager = *ui::UI_NodeManager::Get(true);
   manager.EnableMnemonics();
   auto panel = MakeIntrusive<ShowcasePanel>();
@@ -230,13 +231,16 @@ velkui::ui::SubViewP BuildControlsShowcase(velkui::pictel::Pictel& context,
   divider->UI_SetLocalRectF({kMargin, rows.Bottom() + 4, kControlsShowcaseWidth - 2 * kMargin, 2});
   divider->UI_Show(true);
   panel->ChildPushBack(divider);
-  auto footer = MakeIntrusive<controls::UI_StaticText>(
-      u"Hovered: Cancel \u00B7 focused: Save (Alt shows its mnemonic) \u00B7 pressed: Pressed",
+  auto footerText = MakeIntrusive<controls::UI_StaticText>(
+      !footer.empty() ? footer
+                      : u"Hovered: Cancel \u00B7 focused: Save (Alt shows its mnemonic) \u00B7 "
+                        u"pressed: Pressed",
       false);
-  footer->UI_SetLocalRectF({kMargin, rows.Bottom() + 10, kControlsShowcaseWidth - 2 * kMargin, 20});
-  footer->UI_Show(true);
-  footer->UI_SetDisabled(true);
-  panel->ChildPushBack(footer);
+  footerText->UI_SetLocalRectF(
+      {kMargin, rows.Bottom() + 10, kControlsShowcaseWidth - 2 * kMargin, 20});
+  footerText->UI_Show(true);
+  footerText->UI_SetDisabled(true);
+  panel->ChildPushBack(footerText);
 
   // States that the pointer and the keyboard give.
   save->UI_GainKeyboardFocus();

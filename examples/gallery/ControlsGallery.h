@@ -18,9 +18,11 @@ inline constexpr float kControlsShowcaseHeight = 430;
 // shown, sized kControlsShowcaseWidth x kControlsShowcaseHeight at (0, 0);
 // add it to a window root or draw it with UI_DispatchDrawFromRoot. An
 // installed node manager and theme are needed (the focus and the pointer
-// state belong to the node manager).
+// state belong to the node manager). The footer says which states are shown,
+// unless another text is given.
 velkui::ui::SubViewP BuildControlsShowcase(velkui::pictel::Pictel& context,
-                                           const std::u16string& title);
+                                           const std::u16string& title,
+                                           const std::u16string& footer = {});
 
 // Draws two showcases side by side into `area` of `context`: the left one in
 // the theme's light colours, the right one in the dark interface (the
