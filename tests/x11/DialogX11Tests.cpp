@@ -81,7 +81,7 @@ UI_TextButtonP AddButton(UI_Node& parent, const std::u16string& text, const Rect
 class X11ButtonTest : public X11Test {
  protected:
   X11ButtonTest() {
-    window = MakeWindow({120, 120, 400, 160});
+    window = MakeWindow({120, 120, 400, 160}, kStyleOverlappedWindow);
     background = AddView(*window, {0, 0, 400, 160}, kPaper, "background");
     apply = AddButton(*background, u"Apply", {20, 20, 100, 28});
     loop = AddButton(*background, u"Loop", {140, 20, 100, 28});
@@ -352,6 +352,8 @@ TEST_F(X11DialogTest, ReturnEndsARealModalRunWithOkWhileTheOwnerIsBlocked) {
     user.InjectPointerMove(ownerCorner);
     user.InjectButton(1, true);
     user.InjectButton(1, false);
+    // A window manager may hold the click a moment (to focus the window first).
+    std::this_thread::sleep_for(std::chrono::milliseconds(200));
     Type(user, vk::kReturn);
   });
   EXPECT_EQ(response, UI_Dialog::kOk);
