@@ -42,6 +42,19 @@ void DrawMixedMark(pictel::Pictel& context, const velkcore::RectT<float>& box,
 
 }  // namespace
 
+void UI_CheckButton::SetCheckValue(ButtonValue value) {
+  velkcore::RequireInput(value == kButtonOff || value == kButtonOn);
+  SetValueKnown();
+  if (checkValue_ == value) return;
+  checkValue_ = value;
+  InvalidateAll();
+}
+
+void UI_CheckButton::SendButtonChangedMessage(ui::ModifierKeys modKeys) {
+  SetCheckValue(IsChecked() ? kButtonOff : kButtonOn);
+  UI_Button::SendButtonChangedMessage(modKeys);
+}
+
 UI_Checkbox::UI_Checkbox() {
   UI_SetNodeID("UI_Checkbox");
 }
@@ -51,19 +64,6 @@ UI_Checkbox::UI_Checkbox(const velkcore::UTF16String& label) : UI_Checkbox() {
 }
 
 UI_Checkbox::~UI_Checkbox() = default;
-
-void UI_Checkbox::SetCheckValue(ButtonValue value) {
-  velkcore::RequireInput(value == kButtonOff || value == kButtonOn);
-  SetValueKnown();
-  if (checkValue_ == value) return;
-  checkValue_ = value;
-  InvalidateAll();
-}
-
-void UI_Checkbox::SendButtonChangedMessage(ui::ModifierKeys modKeys) {
-  SetCheckValue(IsChecked() ? kButtonOff : kButtonOn);
-  UI_Button::SendButtonChangedMessage(modKeys);
-}
 
 void UI_Checkbox::SetLabelText(const velkcore::UTF16String& text) {
   UI_ProcessStringAndSetMnemonic(text, displayText_);
@@ -138,19 +138,6 @@ UI_ImageCheckbox::UI_ImageCheckbox(std::string imageBaseName) {
 }
 
 UI_ImageCheckbox::~UI_ImageCheckbox() = default;
-
-void UI_ImageCheckbox::SetCheckValue(ButtonValue value) {
-  velkcore::RequireInput(value == kButtonOff || value == kButtonOn);
-  SetValueKnown();
-  if (checkValue_ == value) return;
-  checkValue_ = value;
-  InvalidateAll();
-}
-
-void UI_ImageCheckbox::SendButtonChangedMessage(ui::ModifierKeys modKeys) {
-  SetCheckValue(IsChecked() ? kButtonOff : kButtonOn);
-  UI_Button::SendButtonChangedMessage(modKeys);
-}
 
 void UI_ImageCheckbox::SetImageBaseName(std::string name) {
   images_.SetBaseName(std::move(name));

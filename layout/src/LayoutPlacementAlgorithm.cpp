@@ -11,8 +11,8 @@ using velkcore::RectT;
 
 namespace {
 
-enum class Axis { Horizontal, Vertical };
-enum class Side { Start, End };
+using Axis = LayoutPlacementAtSide::Axis;
+using End = LayoutPlacementAtSide::End;
 
 // A rectangle seen along one axis: `main` runs along the axis, `cross` across it.
 struct AxisRect {
@@ -23,17 +23,17 @@ struct AxisRect {
 };
 
 AxisRect ToAxis(const RectT<float>& r, Axis axis) {
-  if (axis == Axis::Horizontal) return {r.left, r.width, r.top, r.height};
+  if (axis == Axis::kHorizontal) return {r.left, r.width, r.top, r.height};
   return {r.top, r.height, r.left, r.width};
 }
 
 RectT<float> FromAxis(const AxisRect& a, Axis axis) {
-  if (axis == Axis::Horizontal) return {a.mainStart, a.crossStart, a.mainLength, a.crossLength};
+  if (axis == Axis::kHorizontal) return {a.mainStart, a.crossStart, a.mainLength, a.crossLength};
   return {a.crossStart, a.mainStart, a.crossLength, a.mainLength};
 }
 
 float MainOf(const PointT<float>& size, Axis axis) {
-  return axis == Axis::Horizontal ? size.x : size.y;
+  return axis == Axis::kHorizontal ? size.x : size.y;
 }
 
 bool IsFinite(const RectT<float>& r) {
@@ -41,9 +41,8 @@ bool IsFinite(const RectT<float>& r) {
          std::isfinite(r.height);
 }
 
-// The split shared by the four placements: the own element at the `side` end of `area`
-// along `axis`.
-void SplitArea(Axis axis, Side side, const RectT<float>& area, const PointT<float>& ownSize,
+// The own element at the `end` of `area` along `axis`.
+void SplitArea(Axis axis, End end, const RectT<float>& area, const PointT<float>& ownSize,
                const PointT<float>& decoratedSize, RectT<float>& ownRect,
                RectT<float>& decoratedRect, const ExtraSpaceAlgorithmP& extraSpace) {
   velkcore::RequireInput(extraSpace != nullptr && IsFinite(area));
@@ -56,16 +55,16 @@ void SplitArea(Axis axis, Side side, const RectT<float>& area, const PointT<floa
     return;
   }
   const float areaEnd = a.mainStart + a.mainLength;
-  const float ownStart = side == Side::Start ? a.mainStart : areaEnd - own;
+  const float ownStart = end == End::kStart ? a.mainStart : areaEnd - own;
   ownRect = FromAxis({ownStart, own, a.crossStart, a.crossLength}, axis);
   if (a.mainLength <= own + decorated) {
-    const float restStart = side == Side::Start ? a.mainStart + own : a.mainStart;
+    const float restStart = end == End::kStart ? a.mainStart + own : a.mainStart;
     decoratedRect = FromAxis({restStart, a.mainLength - own, a.crossStart, a.crossLength}, axis);
     return;
   }
-  const float decoratedStart = side == Side::Start ? areaEnd - decorated : a.mainStart;
+  const float decoratedStart = end == End::kStart ? areaEnd - decorated : a.mainStart;
   decoratedRect = FromAxis({decoratedStart, decorated, a.crossStart, a.crossLength}, axis);
-  if (axis == Axis::Horizontal) {
+  if (axis == Axis::kHorizontal) {
     extraSpace->AdjustRectsHorizontally(ownRect, decoratedRect);
   } else {
     extraSpace->AdjustRectsVertically(ownRect, decoratedRect);
@@ -89,17 +88,17 @@ PointT<float> Stacked(const PointT<float>& own, const PointT<float>& decorated) 
 
 LayoutPlacementAlgorithm::~LayoutPlacementAlgorithm() = default;
 
-void LayoutPlacement_LeftOfDO::GetRects(const RectT<float>& area, const PointT<float>& ownSize,
-                                        const PointT<float>& decoratedSize, RectT<float>& ownRect,
-                                        RectT<float>& decoratedRect,
-                                        const ExtraSpaceAlgorithmP& extraSpace) const {
-  SplitArea(Axis::Horizontal, Side::Start, area, ownSize, decoratedSize, ownRect, decoratedRect,
-            extraSpace);
+void LayoutPlacementAtSide::GetRects(const RectT<float>& area, const PointT<float>& ownSize,
+                                     const PointT<float>& decoratedSize, RectT<float>& ownRect,
+                                     RectT<float>& decoratedRect,
+                                     const ExtraSpaceAlgorithmP& extraSpace) const {
+  SplitArea(axis_, end_, area, ownSize, decoratedSize, ownRect, decoratedRect, extraSpace);
 }
 
-PointT<float> LayoutPlacement_LeftOfDO::GetCombinedSize(const PointT<float>& ownSize,
-                                                        const PointT<float>& decoratedSize) const {
-  return SideBySide(ownSize, decoratedSize);
+PointT<float> LayoutPlacementAtSide::GetCombinedSize(const PointT<float>& ownSize,
+                                                     const PointT<float>& decoratedSize) const {
+  return axis_ == Axis::kHorizontal ? SideBySide(ownSize, decoratedSize)
+                                    : Stacked(ownSize, decoratedSize);
 }
 
 const LayoutPlacementAlgorithmP& LayoutPlacement_LeftOfDO::GetSharedPtr() {
@@ -107,53 +106,14 @@ const LayoutPlacementAlgorithmP& LayoutPlacement_LeftOfDO::GetSharedPtr() {
   return shared;
 }
 
-void LayoutPlacement_RightOfDO::GetRects(const RectT<float>& area, const PointT<float>& ownSize,
-                                         const PointT<float>& decoratedSize, RectT<float>& ownRect,
-                                         RectT<float>& decoratedRect,
-                                         const ExtraSpaceAlgorithmP& extraSpace) const {
-  SplitArea(Axis::Horizontal, Side::End, area, ownSize, decoratedSize, ownRect, decoratedRect,
-            extraSpace);
-}
-
-PointT<float> LayoutPlacement_RightOfDO::GetCombinedSize(const PointT<float>& ownSize,
-                                                         const PointT<float>& decoratedSize) const {
-  return SideBySide(ownSize, decoratedSize);
-}
-
 const LayoutPlacementAlgorithmP& LayoutPlacement_RightOfDO::GetSharedPtr() {
   static const LayoutPlacementAlgorithmP shared(new LayoutPlacement_RightOfDO());
   return shared;
 }
 
-void LayoutPlacement_AboveDO::GetRects(const RectT<float>& area, const PointT<float>& ownSize,
-                                       const PointT<float>& decoratedSize, RectT<float>& ownRect,
-                                       RectT<float>& decoratedRect,
-                                       const ExtraSpaceAlgorithmP& extraSpace) const {
-  SplitArea(Axis::Vertical, Side::Start, area, ownSize, decoratedSize, ownRect, decoratedRect,
-            extraSpace);
-}
-
-PointT<float> LayoutPlacement_AboveDO::GetCombinedSize(const PointT<float>& ownSize,
-                                                       const PointT<float>& decoratedSize) const {
-  return Stacked(ownSize, decoratedSize);
-}
-
 const LayoutPlacementAlgorithmP& LayoutPlacement_AboveDO::GetSharedPtr() {
   static const LayoutPlacementAlgorithmP shared(new LayoutPlacement_AboveDO());
   return shared;
-}
-
-void LayoutPlacement_BelowDO::GetRects(const RectT<float>& area, const PointT<float>& ownSize,
-                                       const PointT<float>& decoratedSize, RectT<float>& ownRect,
-                                       RectT<float>& decoratedRect,
-                                       const ExtraSpaceAlgorithmP& extraSpace) const {
-  SplitArea(Axis::Vertical, Side::End, area, ownSize, decoratedSize, ownRect, decoratedRect,
-            extraSpace);
-}
-
-PointT<float> LayoutPlacement_BelowDO::GetCombinedSize(const PointT<float>& ownSize,
-                                                       const PointT<float>& decoratedSize) const {
-  return Stacked(ownSize, decoratedSize);
 }
 
 const LayoutPlacementAlgorithmP& LayoutPlacement_BelowDO::GetSharedPtr() {

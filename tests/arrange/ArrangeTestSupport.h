@@ -5,6 +5,9 @@
 #include <memory>
 #include <vector>
 
+#include <gtest/gtest.h>
+
+#include <velkcore/Error.h>
 #include <velkui/arrange/DefaultGroup.h>
 #include <velkui/arrange/DynamicGroup.h>
 #include <velkui/arrange/Groups.h>
@@ -116,8 +119,39 @@ class TestGroup : public DefaultGroup<DynamicGroup> {
   bool withSeparators_;
 };
 
+// Leaves of the given sizes held, in order, by a group of the given type.
+class Held {
+ public:
+  Held(GroupArrangementType type, const std::vector<PointF>& sizes, bool separators = false)
+      : group(type, separators) {
+    std::vector<IArrangeable*> children;
+    for (const PointF& size : sizes) {
+      leaves.push_back(std::make_unique<Box>(size.x, size.y));
+      children.push_back(leaves.back().get());
+    }
+    group.Hold(children);
+  }
+  Box& operator[](std::size_t i) { return *leaves.at(i); }
+
+  std::vector<std::unique_ptr<Box>> leaves;
+  TestGroup group;
+};
+
 inline bool HasNaN(const RectF& r) {
   return std::isnan(r.left) || std::isnan(r.top) || std::isnan(r.width) || std::isnan(r.height);
 }
+
+inline bool IsContractViolation(const velkcore::Exception& e) {
+  return e.GetLevel() == velkcore::ErrorLevel::kContractViolation && e.GetCategory() == 105 &&
+         e.GetNumber() == 25;
+}
+
+#define EXPECT_CONTRACT_VIOLATION(statement)         \
+  try {                                              \
+    statement;                                       \
+    ADD_FAILURE() << "no contract violation";        \
+  } catch (const velkcore::Exception& e) {           \
+    EXPECT_TRUE(IsContractViolation(e)) << e.what(); \
+  }
 
 }  // namespace velkui::arrange::test

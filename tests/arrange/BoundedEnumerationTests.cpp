@@ -124,12 +124,6 @@ TEST(BoundedEnumerationTest, SmallProductsAreEnumeratedCompletely) {
   EXPECT_EQ(MinSizes(root.Arrangements()), ParetoFront(all));
 }
 
-}  // namespace
-}  // namespace velkui::arrange::test
-
-namespace velkui::arrange::test {
-namespace {
-
 // A thousand nested rows and columns, each holding a leaf and the next group: the staircase of
 // leaves comes out exactly, without descending the chain once per level.
 TEST(DeepTreeTest, ChainOfAThousandNestedGroupsIsArrangedExactly) {

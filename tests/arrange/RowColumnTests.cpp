@@ -26,30 +26,36 @@ TEST(RowTest, MinimumAndBestSizesIncludeSpacingAndMargins) {
   EXPECT_FLOAT_EQ(set[0]->BestHeight(), 28);
 }
 
-TEST(RowTest, CentresTheRunAndEachChildAcross) {
-  Box a(10, 10);
-  Box b(20, 30);
-  TestGroup row(Type::Row);
-  row.SetHorizontalAlignment(AlignmentHorizontal::Center);
-  row.SetVerticalAlignment(AlignmentVertical::Center);
-  row.SetHorizontalSpacing(10);
-  row.Hold({&a, &b});
-  row.Arrange({100, 200, 100, 50});
-  // Run of 10 + 10 + 20 = 40 centred in 100.
-  EXPECT_EQ(a.Last(), (RectF{130, 220, 10, 10}));
-  EXPECT_EQ(b.Last(), (RectF{150, 210, 20, 30}));
-}
-
-TEST(RowTest, EndAlignmentPutsTheRunAgainstTheRightAndBottom) {
-  Box a(10, 10);
-  Box b(20, 30);
-  TestGroup row(Type::Row);
-  row.SetHorizontalAlignment(AlignmentHorizontal::Right);
-  row.SetVerticalAlignment(AlignmentVertical::Bottom);
-  row.Hold({&a, &b});
-  row.Arrange({0, 0, 100, 50});
-  EXPECT_EQ(a.Last(), (RectF{70, 40, 10, 10}));
-  EXPECT_EQ(b.Last(), (RectF{80, 20, 20, 30}));
+TEST(RowTest, AlignmentPlacesTheRunAndEachChildAcross) {
+  const struct {
+    AlignmentHorizontal horizontal;
+    AlignmentVertical vertical;
+    float spacing;
+    RectF area, a, b;
+  } cases[] = {
+      // Run of 10 + 10 + 20 = 40 centred in 100.
+      {AlignmentHorizontal::Center,
+       AlignmentVertical::Center,
+       10,
+       {100, 200, 100, 50},
+       {130, 220, 10, 10},
+       {150, 210, 20, 30}},
+      {AlignmentHorizontal::Right,
+       AlignmentVertical::Bottom,
+       0,
+       {0, 0, 100, 50},
+       {70, 40, 10, 10},
+       {80, 20, 20, 30}},
+  };
+  for (const auto& c : cases) {
+    Held row(Type::Row, {{10, 10}, {20, 30}});
+    row.group.SetHorizontalAlignment(c.horizontal);
+    row.group.SetVerticalAlignment(c.vertical);
+    row.group.SetHorizontalSpacing(c.spacing);
+    row.group.Arrange(c.area);
+    EXPECT_EQ(row[0].Last(), c.a);
+    EXPECT_EQ(row[1].Last(), c.b);
+  }
 }
 
 TEST(RowTest, ExtraWidthIsSharedInProportionAndACappedChildPassesItOn) {
@@ -78,15 +84,6 @@ TEST(RowTest, ExtraWidthNeverGoesToChildrenThatCannotGrow) {
   row.Arrange({0, 0, 100, 10});
   EXPECT_EQ(fixed.Last(), (RectF{0, 0, 10, 10}));
   EXPECT_EQ(grows.Last(), (RectF{10, 0, 90, 10}));
-
-  Box c(10, 10);
-  Box d(20, 10);
-  TestGroup still(Type::Row);
-  still.SetHorizontalAlignment(AlignmentHorizontal::Right);
-  still.Hold({&c, &d});
-  still.Arrange({0, 0, 100, 10});
-  EXPECT_EQ(c.Last(), (RectF{70, 0, 10, 10}));
-  EXPECT_EQ(d.Last(), (RectF{80, 0, 20, 10}));
 }
 
 TEST(RowTest, ZeroWidthExpandableChildrenGetNothingAndNoNaN) {
@@ -123,38 +120,33 @@ TEST(RowTest, RunThatFitsItsMinimumNeverOverflowsEvenWhenBestIsWider) {
 }
 
 TEST(RowTest, NestedGroupWithMarginsDoesNotOverlapItsNextSibling) {
-  Box inner(20, 10);
-  TestGroup nested(Type::Row);
-  nested.SetLeftMargin(5);
-  nested.SetRightMargin(5);
-  nested.Hold({&inner});
+  Held nested(Type::Row, {{20, 10}});
+  nested.group.SetLeftMargin(5);
+  nested.group.SetRightMargin(5);
   Box after(10, 10);
   TestGroup outer(Type::Row);
-  outer.Hold({&nested, &after});
+  outer.Hold({&nested.group, &after});
   outer.Arrange({0, 0, 200, 10});
-  EXPECT_EQ(inner.Last(), (RectF{5, 0, 20, 10}));
+  EXPECT_EQ(nested[0].Last(), (RectF{5, 0, 20, 10}));
   EXPECT_EQ(after.Last(), (RectF{30, 0, 10, 10}));
   // The nested group reports the rectangle it was given and the size it used.
-  EXPECT_EQ(nested.position, (PointF{0, 0}));
-  EXPECT_EQ(nested.dimensions, (PointF{30, 10}));
+  EXPECT_EQ(nested.group.position, (PointF{0, 0}));
+  EXPECT_EQ(nested.group.dimensions, (PointF{30, 10}));
 }
 
 TEST(RowTest, SeparatorsCoverEachGapAlongTheShorterNeighbour) {
-  Box a(10, 30);
-  Box b(10, 10);
-  Box c(10, 20);
-  TestGroup row(Type::Row, true);
-  row.SetHorizontalSpacing(4);
-  row.SetVerticalAlignment(AlignmentVertical::Center);
-  row.Hold({&a, &b, &c});
-  row.Arrange({0, 0, 100, 30});
-  ASSERT_EQ(row.built.size(), 2u);
-  EXPECT_FALSE(row.built[0]->across);
-  EXPECT_EQ(row.built[0]->frame, (RectF{10, 10, 4, 10}));
-  EXPECT_EQ(row.built[1]->frame, (RectF{24, 10, 4, 10}));
+  Held row(Type::Row, {{10, 30}, {10, 10}, {10, 20}}, true);
+  TestGroup& group = row.group;
+  group.SetHorizontalSpacing(4);
+  group.SetVerticalAlignment(AlignmentVertical::Center);
+  group.Arrange({0, 0, 100, 30});
+  ASSERT_EQ(group.built.size(), 2u);
+  EXPECT_FALSE(group.built[0]->across);
+  EXPECT_EQ(group.built[0]->frame, (RectF{10, 10, 4, 10}));
+  EXPECT_EQ(group.built[1]->frame, (RectF{24, 10, 4, 10}));
   // Rebuilding with the same number of children keeps the separators.
-  row.Invalidate();
-  EXPECT_EQ(row.clearCalls, 1);
+  group.Invalidate();
+  EXPECT_EQ(group.clearCalls, 1);
 }
 
 TEST(ColumnTest, MirrorsTheRowOnTheOtherAxis) {
@@ -178,15 +170,12 @@ TEST(ColumnTest, MirrorsTheRowOnTheOtherAxis) {
 }
 
 TEST(FlippingTest, PicksTheRowWhenWideAndTheColumnWhenTall) {
-  Box a(30, 10);
-  Box b(30, 10);
-  TestGroup flipping(Type::Flipping);
-  flipping.Hold({&a, &b});
-  EXPECT_EQ(flipping.Arrangements().Size(), 2u);
-  flipping.Arrange({0, 0, 100, 10});
-  EXPECT_EQ(b.Last(), (RectF{30, 0, 30, 10}));
-  flipping.Arrange({0, 0, 30, 100});
-  EXPECT_EQ(b.Last(), (RectF{0, 10, 30, 10}));
+  Held flipping(Type::Flipping, {{30, 10}, {30, 10}});
+  EXPECT_EQ(flipping.group.Arrangements().Size(), 2u);
+  flipping.group.Arrange({0, 0, 100, 10});
+  EXPECT_EQ(flipping[1].Last(), (RectF{30, 0, 30, 10}));
+  flipping.group.Arrange({0, 0, 30, 100});
+  EXPECT_EQ(flipping[1].Last(), (RectF{0, 10, 30, 10}));
 }
 
 }  // namespace

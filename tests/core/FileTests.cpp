@@ -13,19 +13,14 @@
 
 #include <gtest/gtest.h>
 
+#include "CoreTestSupport.h"
+
 using namespace velkcore;
+using velkcore_test::ErrorOf;
+using velkcore_test::Raises;
 namespace fs = std::filesystem;
 
 namespace {
-
-std::optional<Exception> ErrorOf(const std::function<void()>& action) {
-  try {
-    action();
-  } catch (const Exception& e) {
-    return e;
-  }
-  return std::nullopt;
-}
 
 void WriteText(const fs::path& path, const std::string& text) {
   std::ofstream(path, std::ios::binary) << text;

@@ -25,9 +25,9 @@ double Parse(std::u16string_view text, NumberFormatFlags flags = {}) {
 
 TEST_F(NumbersTest, RoundsToTheDecimalPlaces) {
   EXPECT_EQ(NumberToString(3.14159, 2), u"3.14");
-  EXPECT_EQ(NumberToString(2.5, 0), u"2");    // round-half-even on the exact binary value
+  EXPECT_EQ(NumberToString(2.5, 0), u"2");  // round-half-even on the exact binary value
   EXPECT_EQ(NumberToString(0.125, 2), u"0.12");
-  EXPECT_EQ(NumberToString(1.005, 2), u"1.00");  // 1.005 is really 1.00499999...
+  EXPECT_EQ(NumberToString(1.005, 2), u"1.00");   // 1.005 is really 1.00499999...
   EXPECT_EQ(NumberToString(-0.001, 2), u"0.00");  // no "-0.00"
   EXPECT_EQ(NumberToString(-0.0, 0), u"0");
   EXPECT_EQ(NumberToString(-7.25, 1), u"-7.2");
@@ -46,8 +46,9 @@ TEST_F(NumbersTest, EveryFormatFlag) {
   EXPECT_EQ(NumberToString(5.0, 0, kFormatPadSign), u" 5");
   EXPECT_EQ(NumberToString(-5.0, 0, kFormatPadSign), u"-5");
   EXPECT_EQ(NumberToString(42.0, 1, kFormatLeadingSpaces), u"        42.0");
-  EXPECT_EQ(NumberToString(1000.0, 1, kFormatUseSeparator | kFormatAlwaysSign |
-                                          kFormatNoTrailingZeros | kFormatLeadingSpaces),
+  EXPECT_EQ(NumberToString(1000.0, 1,
+                           kFormatUseSeparator | kFormatAlwaysSign | kFormatNoTrailingZeros |
+                               kFormatLeadingSpaces),
             u"      +1,000");
 }
 
@@ -98,8 +99,8 @@ TEST_F(NumbersTest, ParsesEverythingTheFormatterWrites) {
 }
 
 TEST_F(NumbersTest, RejectsWhatIsNotANumberAndLeavesTheValue) {
-  for (const char16_t* bad : {u"", u"-", u"abc", u"1.2.3", u"12abc", u"1e999", u",5", u"1,,000",
-                              u"--1", u"."}) {
+  for (const char16_t* bad :
+       {u"", u"-", u"abc", u"1.2.3", u"12abc", u"1e999", u",5", u"1,,000", u"--1", u"."}) {
     double v = 7.0;
     EXPECT_FALSE(StringToNumber(bad, v)) << UTF16to8(bad);
     EXPECT_EQ(v, 7.0);

@@ -1,26 +1,19 @@
 #include <velkcore/PropList.h>
 
 #include <cmath>
-#include <functional>
 #include <limits>
-#include <optional>
 #include <string>
 #include <vector>
 
 #include <gtest/gtest.h>
 
+#include "CoreTestSupport.h"
+
 using namespace velkcore;
+using velkcore_test::ErrorOf;
+using velkcore_test::Raises;
 
 namespace {
-
-std::optional<Exception> ErrorOf(const std::function<void()>& action) {
-  try {
-    action();
-  } catch (const Exception& e) {
-    return e;
-  }
-  return std::nullopt;
-}
 
 template <typename T>
 concept CanSet = requires(PropList list, T value) {
@@ -126,10 +119,7 @@ TEST(PropList, NumbersConvertOnlyWhenExact) {
       {[&] { list.Get("odd", f); }, "'odd' holds the int32 value 16777217, which float"},
   };
   for (const auto& [get, message] : refused) {
-    const auto error = ErrorOf(get);
-    ASSERT_TRUE(error) << message;
-    EXPECT_EQ(error->GetKey(), kPropListNotRepresentableKey);
-    EXPECT_NE(std::string(error->what()).find(message), std::string::npos) << error->what();
+    EXPECT_TRUE(Raises(get, kPropListNotRepresentableKey, message)) << message;
   }
   EXPECT_EQ(i, 40000) << "a refused conversion writes nothing";
 }
@@ -152,10 +142,7 @@ TEST(PropList, OtherMismatchesRaiseNamingKeyAndTypes) {
       {[&] { list.GetSubList("name"); }, "The property 'name' holds string, not property list."},
   };
   for (const auto& [get, message] : cases) {
-    const auto error = ErrorOf(get);
-    ASSERT_TRUE(error) << message;
-    EXPECT_EQ(error->GetKey(), kPropListTypeMismatchKey);
-    EXPECT_EQ(error->what(), message);
+    EXPECT_TRUE(Raises(get, kPropListTypeMismatchKey, message, true)) << message;
   }
 }
 
@@ -270,11 +257,7 @@ TEST(PropList, RectangleRecordsThatAreIncompleteOrMistyped) {
        },
        "The property 'height' holds string, not float."},
   };
-  for (const auto& [read, message] : cases) {
-    const auto error = ErrorOf(read);
-    ASSERT_TRUE(error) << message;
-    EXPECT_EQ(error->what(), message);
-  }
+  for (const auto& [read, message] : cases) EXPECT_TRUE(Raises(read, "", message, true));
   EXPECT_EQ(f, (RectT<float>{1, 2, 3, 4}));
   EXPECT_EQ(p, (PointT<float>{5, 6}));
 }

@@ -3,6 +3,8 @@
 
 #include <gtest/gtest.h>
 
+#include "CoreTestSupport.h"
+
 #include <string_view>
 
 namespace velkcore_test {
@@ -26,13 +28,10 @@ TEST(Resources, CompiledFilesAreFoundByNameAndCaseInsensitiveType) {
 
 TEST(Resources, MissingResourceNamesItselfInTheError) {
   const ResourceModule& module = velkcore_test::TestResources();
-  try {
-    GetBinaryFromModule(module, "Empty", "png");
-    FAIL();
-  } catch (const Exception& e) {
-    EXPECT_EQ(e.GetCategory(), 105);
-    EXPECT_EQ(e.GetNumber(), 20);
-    EXPECT_STREQ(e.what(), "Unable to access resource 'Empty' (type png)");
-  }
+  const auto e = velkcore_test::ErrorOf([&] { GetBinaryFromModule(module, "Empty", "png"); });
+  ASSERT_TRUE(e);
+  EXPECT_EQ(e->GetCategory(), 105);
+  EXPECT_EQ(e->GetNumber(), 20);
+  EXPECT_STREQ(e->what(), "Unable to access resource 'Empty' (type png)");
   EXPECT_EQ(module.Find("Nope", "xml"), nullptr);
 }

@@ -18,7 +18,9 @@ TEST(Strings, MalformedInputBecomesReplacementCharacters) {
   EXPECT_EQ(UTF8to16("\xED\xA0\x80!"), UTF16String(u"\uFFFD\uFFFD\uFFFD!"));
   EXPECT_EQ(UTF8to16("\x80"), UTF16String(u"\uFFFD"));
   const UTF16String lone{u'a', char16_t(0xD800), u'b', char16_t(0xDC00)};
-  EXPECT_EQ(UTF16to8(lone), "a\xEF\xBF\xBD" "b\xEF\xBF\xBD");
+  EXPECT_EQ(UTF16to8(lone),
+            "a\xEF\xBF\xBD"
+            "b\xEF\xBF\xBD");
   EXPECT_EQ(AsciiToUTF16("ok\xFF"), UTF16String(u"ok\uFFFD"));
 }
 

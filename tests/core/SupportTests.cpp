@@ -44,11 +44,17 @@ TEST(SharedFunctions, ACallbackMayDestroyTheList) {
 TEST(SharedFunctions, DuplicatesEmptyFunctionsAndCallUntilTrue) {
   SharedFunctions<bool()> list;
   int calls = 0;
-  auto handler = std::make_shared<std::function<bool()>>([&] { ++calls; return true; });
+  auto handler = std::make_shared<std::function<bool()>>([&] {
+    ++calls;
+    return true;
+  });
   list.Add(handler);
   list.Add(handler);
   EXPECT_EQ(list.Size(), 1u);
-  list.Add([&] { ++calls; return false; });
+  list.Add([&] {
+    ++calls;
+    return false;
+  });
   EXPECT_TRUE(list.CallUntilTrue());
   EXPECT_EQ(calls, 1);
   EXPECT_THROW(list.Add(SharedFunctions<bool()>::FunctionPtr{}), Exception);

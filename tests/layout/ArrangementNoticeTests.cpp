@@ -15,8 +15,6 @@ namespace velkui::layout::test {
 namespace {
 
 using arrange::GroupArrangementType;
-using ui::ArrangementViewP;
-using ui::UI_ArrangementView;
 
 // Placements of the counting views below, and how deeply they were nested: a placement that
 // starts while another is still running means an arrangement re-entered itself.
@@ -87,16 +85,8 @@ class NoticeRecorder : public ui::UI_SubView {
   std::vector<const ui::UI_Node*> notices;
 };
 
-// A window stand-in (0, 0, 400, 300) holding a panel at (30, 40); views go into the panel.
-class ArrangementNoticeTest : public ::testing::Test {
+class ArrangementNoticeTest : public ArrangementPanelTest {
  protected:
-  ArrangementViewP MakeView(GroupArrangementType type, RectT<float> frame = {10, 20, 200, 100}) {
-    auto view = velkcore::MakeIntrusive<UI_ArrangementView>(type);
-    view->UI_SetLocalRectF(frame);
-    view->UI_Show(true);
-    return view;
-  }
-
   template <typename Child = CountingView>
   boost::intrusive_ptr<Child> AddCounting(ui::UI_Node& parent, const RectT<float>& frame) {
     auto child = velkcore::MakeIntrusive<Child>(log, frame);
@@ -104,11 +94,7 @@ class ArrangementNoticeTest : public ::testing::Test {
     return child;
   }
 
-  void Attach(const ArrangementViewP& view) { panel->ChildPushBack(view); }
-
   PlacementLog log;
-  boost::intrusive_ptr<FixedView> host = AddFixed(nullptr, {0, 0, 400, 300});
-  boost::intrusive_ptr<FixedView> panel = AddFixed(host.get(), {30, 40, 300, 200});
 };
 
 TEST_F(ArrangementNoticeTest, EveryFrameVisibilityAndMatrixChangeReachesTheParent) {

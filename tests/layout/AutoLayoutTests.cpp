@@ -37,28 +37,29 @@ class AutoLayoutTest : public ::testing::Test {
   boost::intrusive_ptr<FixedView> first, second, third;
 };
 
-TEST_F(AutoLayoutTest, GrowthMovesTheFollowingChildrenAndTheViewKeepsItsMargins) {
-  auto view = MakeRow(true);
-  view->AutoLayout(&context_);
-  EXPECT_RECT(first->UI_GetLocalRectF(true), 10, 10, 40, 20);
-  EXPECT_RECT(second->UI_GetLocalRectF(true), 60, 10, 60, 20);
-  EXPECT_RECT(third->UI_GetLocalRectF(true), 130, 10, 40, 20);
-  EXPECT_RECT(view->UI_GetLocalRectF(true), 5, 5, 220, 50);
-}
-
-TEST_F(AutoLayoutTest, WithoutMarginsTheViewFitsTheRightMostAndBottomMostEdges) {
-  auto view = MakeRow(false);
-  view->AutoLayout(&context_);
-  EXPECT_RECT(third->UI_GetLocalRectF(true), 130, 10, 40, 20);
-  EXPECT_RECT(view->UI_GetLocalRectF(true), 5, 5, 170, 30);
-}
-
-TEST_F(AutoLayoutTest, NothingGrowsNothingMoves) {
-  auto view = MakeRow(false);
-  second->SetRecommended({10, 5});
-  view->AutoLayout(&context_);
-  EXPECT_RECT(second->UI_GetLocalRectF(true), 60, 10, 40, 20);
-  EXPECT_RECT(view->UI_GetLocalRectF(true), 5, 5, 200, 50);
+// The middle child asks for 60 × 20 unless told otherwise: growth moves the following
+// children; with margins the view keeps them, without it fits the right-most and bottom-most
+// edges; a child never shrinks below its authored size.
+TEST_F(AutoLayoutTest, GrowthMovesTheFollowingChildrenAndSizesTheView) {
+  const struct {
+    bool maintainMargins;
+    PointT<float> recommended;
+    RectT<float> second, third, view;
+  } cases[] = {
+      {true, {60, 20}, {60, 10, 60, 20}, {130, 10, 40, 20}, {5, 5, 220, 50}},
+      {false, {60, 20}, {60, 10, 60, 20}, {130, 10, 40, 20}, {5, 5, 170, 30}},
+      {false, {10, 5}, {60, 10, 40, 20}, {110, 10, 40, 20}, {5, 5, 200, 50}},
+      {true, {70, 5}, {60, 10, 70, 20}, {140, 10, 40, 20}, {5, 5, 230, 50}},
+  };
+  for (const auto& c : cases) {
+    auto view = MakeRow(c.maintainMargins);
+    second->SetRecommended(c.recommended);
+    view->AutoLayout(&context_);
+    EXPECT_RECT(first->UI_GetLocalRectF(true), 10, 10, 40, 20);
+    EXPECT_SAME_RECT(second->UI_GetLocalRectF(true), c.second);
+    EXPECT_SAME_RECT(third->UI_GetLocalRectF(true), c.third);
+    EXPECT_SAME_RECT(view->UI_GetLocalRectF(true), c.view);
+  }
 }
 
 TEST_F(AutoLayoutTest, ChildrenAreTakenInOrderOfTheirEdgeAndOriginsAreWholeNumbers) {
@@ -74,13 +75,6 @@ TEST_F(AutoLayoutTest, ChildrenAreTakenInOrderOfTheirEdgeAndOriginsAreWholeNumbe
   EXPECT_RECT(upper->UI_GetLocalRectF(true), 0, 10, 30, 31);
   EXPECT_RECT(lower->UI_GetLocalRectF(true), 3, 61, 30, 20);
   EXPECT_RECT(view->UI_GetLocalRectF(true), 0, 0, 33, 81);
-}
-
-TEST_F(AutoLayoutTest, AChildNeverShrinksBelowItsAuthoredSize) {
-  auto view = MakeRow(true);
-  second->SetRecommended({70, 5});
-  view->AutoLayout(&context_);
-  EXPECT_RECT(second->UI_GetLocalRectF(true), 60, 10, 70, 20);
 }
 
 TEST_F(AutoLayoutTest, ScaledChildrenShareTheLargestSizeAcross) {
@@ -155,8 +149,6 @@ TEST(LayoutViewTest, PropertiesAreTheLayoutFlags) {
   view->SetScaleChildren(false);
   view->SetLayoutMode(1);
   EXPECT_EQ(view->UI_GetSubViewLayoutFlags().Get(), 0x05);
-  EXPECT_TRUE(view->GetMaintainMargins());
-  EXPECT_FALSE(view->GetScaleChildren());
 }
 
 }  // namespace

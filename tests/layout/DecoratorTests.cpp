@@ -13,56 +13,41 @@ namespace {
 
 const RectT<float> kArea{0, 0, 100, 40};
 
-TEST(SpacerTest, KeptExtraSpaceWidensTheSpacerToOneUnitShortOfTheObject) {
-  auto object = Recording(50, 20);
-  auto spacer = velkcore::MakeIntrusive<SpacerOnTheLeft>(object, 10.0f, true);
-  spacer->SetLocation(kArea);
-  EXPECT_RECT(object->Last(), 50, 0, 50, 40);
-  EXPECT_RECT(spacer->GetOwnRect(), 0, 0, 49, 40);
+using SpacerP = boost::intrusive_ptr<StrategicLayoutDecorator>;
+
+template <typename Spacer>
+SpacerP Make(SmartLayoutP object, bool keeps) {
+  return velkcore::MakeIntrusive<Spacer>(std::move(object), 10.0f, keeps);
 }
 
-TEST(SpacerTest, PassedExtraSpaceWidensTheObjectToOneUnitAfterTheSpacer) {
-  auto object = Recording(50, 20);
-  auto spacer = velkcore::MakeIntrusive<SpacerOnTheLeft>(object, 10.0f, false);
-  spacer->SetLocation(kArea);
-  EXPECT_RECT(spacer->GetOwnRect(), 0, 0, 10, 40);
-  EXPECT_RECT(object->Last(), 11, 0, 89, 40);
-}
-
-TEST(SpacerTest, RightSpacerMirrorsTheLeftOne) {
-  auto object = Recording(50, 20);
-  auto keep = velkcore::MakeIntrusive<SpacerOnTheRight>(object, 10.0f, true);
-  keep->SetLocation(kArea);
-  EXPECT_RECT(object->Last(), 0, 0, 50, 40);
-  EXPECT_RECT(keep->GetOwnRect(), 51, 0, 49, 40);
-
-  auto pass = velkcore::MakeIntrusive<SpacerOnTheRight>(object, 10.0f, false);
-  pass->SetLocation(kArea);
-  EXPECT_RECT(pass->GetOwnRect(), 90, 0, 10, 40);
-  EXPECT_RECT(object->Last(), 0, 0, 89, 40);
-}
-
-TEST(SpacerTest, VerticalSpacersLeaveNoGap) {
-  const RectT<float> area{0, 0, 40, 100};
-  auto object = Recording(20, 50);
-  auto topKeep = velkcore::MakeIntrusive<SpacerOnTheTop>(object, 10.0f, true);
-  topKeep->SetLocation(area);
-  EXPECT_RECT(topKeep->GetOwnRect(), 0, 0, 40, 50);
-  EXPECT_RECT(object->Last(), 0, 50, 40, 50);
-
-  auto topPass = velkcore::MakeIntrusive<SpacerOnTheTop>(object, 10.0f, false);
-  topPass->SetLocation(area);
-  EXPECT_RECT(object->Last(), 0, 10, 40, 90);
-
-  auto bottomKeep = velkcore::MakeIntrusive<SpacerOnTheBottom>(object, 10.0f, true);
-  bottomKeep->SetLocation(area);
-  EXPECT_RECT(object->Last(), 0, 0, 40, 50);
-  EXPECT_RECT(bottomKeep->GetOwnRect(), 0, 50, 40, 50);
-
-  auto bottomPass = velkcore::MakeIntrusive<SpacerOnTheBottom>(object, 10.0f, false);
-  bottomPass->SetLocation(area);
-  EXPECT_RECT(object->Last(), 0, 0, 40, 90);
-  EXPECT_RECT(bottomPass->GetOwnRect(), 0, 90, 40, 10);
+// Keeping the extra space widens the spacer to one unit short of the object; passing it
+// widens the object to one unit after the spacer. Vertical spacers leave no gap.
+TEST(SpacerTest, EachSideKeepsOrPassesTheExtraSpace) {
+  const RectT<float> tall{0, 0, 40, 100};
+  const struct {
+    const char* name;
+    SpacerP (*make)(SmartLayoutP object, bool keeps);
+    bool keeps;
+    RectT<float> area, object, spacer;
+  } cases[] = {
+      {"left keeps", Make<SpacerOnTheLeft>, true, kArea, {50, 0, 50, 40}, {0, 0, 49, 40}},
+      {"left passes", Make<SpacerOnTheLeft>, false, kArea, {11, 0, 89, 40}, {0, 0, 10, 40}},
+      {"right keeps", Make<SpacerOnTheRight>, true, kArea, {0, 0, 50, 40}, {51, 0, 49, 40}},
+      {"right passes", Make<SpacerOnTheRight>, false, kArea, {0, 0, 89, 40}, {90, 0, 10, 40}},
+      {"top keeps", Make<SpacerOnTheTop>, true, tall, {0, 50, 40, 50}, {0, 0, 40, 50}},
+      {"top passes", Make<SpacerOnTheTop>, false, tall, {0, 10, 40, 90}, {0, 0, 40, 10}},
+      {"bottom keeps", Make<SpacerOnTheBottom>, true, tall, {0, 0, 40, 50}, {0, 50, 40, 50}},
+      {"bottom passes", Make<SpacerOnTheBottom>, false, tall, {0, 0, 40, 90}, {0, 90, 40, 10}},
+  };
+  for (const auto& c : cases) {
+    SCOPED_TRACE(c.name);
+    const bool horizontal = c.area.width > c.area.height;
+    auto object = horizontal ? Recording(50, 20) : Recording(20, 50);
+    const SpacerP spacer = c.make(object, c.keeps);
+    spacer->SetLocation(c.area);
+    EXPECT_SAME_RECT(object->Last(), c.object);
+    EXPECT_SAME_RECT(spacer->GetOwnRect(), c.spacer);
+  }
 }
 
 TEST(SpacerTest, TightAndTooSmallAreas) {

@@ -13,6 +13,7 @@
 #include <velkcore/Geometry.h>
 #include <velkcore/RefCountedObject.h>
 #include <velkui/layout/SmartLayout.h>
+#include <velkui/ui/UI_ArrangementView.h>
 #include <velkui/ui/UI_SubView.h>
 
 namespace velkui::layout::test {
@@ -81,6 +82,9 @@ inline std::string Describe(const RectT<float>& r) {
   EXPECT_EQ(::velkui::layout::test::Describe(actual), \
             ::velkui::layout::test::Describe(::velkcore::RectT<float>{l, t, w, h}))
 
+#define EXPECT_SAME_RECT(actual, expected) \
+  EXPECT_EQ(::velkui::layout::test::Describe(actual), ::velkui::layout::test::Describe(expected))
+
 // Whether `f` raises the input-contract violation (category 105, number 25).
 template <typename F>
 ::testing::AssertionResult ViolatesContract(F&& f) {
@@ -97,5 +101,24 @@ template <typename F>
 
 #define EXPECT_CONTRACT_VIOLATION(statement) \
   EXPECT_TRUE(::velkui::layout::test::ViolatesContract([&] { statement; }))
+
+// A window stand-in (0, 0, 400, 300) holding a panel at (30, 40), into which arrangement views
+// go: a view made at its default frame has its origin at (40, 60) in global coordinates.
+class ArrangementPanelTest : public ::testing::Test {
+ protected:
+  template <typename View = ui::UI_ArrangementView>
+  boost::intrusive_ptr<View> MakeView(arrange::GroupArrangementType type,
+                                      RectT<float> frame = {10, 20, 200, 100}) {
+    auto view = velkcore::MakeIntrusive<View>(type);
+    view->UI_SetLocalRectF(frame);
+    view->UI_Show(true);
+    return view;
+  }
+
+  void Attach(const ui::ArrangementViewP& view) { panel->ChildPushBack(view); }
+
+  boost::intrusive_ptr<FixedView> host = AddFixed(nullptr, {0, 0, 400, 300});
+  boost::intrusive_ptr<FixedView> panel = AddFixed(host.get(), {30, 40, 300, 200});
+};
 
 }  // namespace velkui::layout::test

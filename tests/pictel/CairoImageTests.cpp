@@ -10,6 +10,8 @@
 #include <velkui/pictel/PictelHandles.h>
 #include <velkui/test/PixelProbe.h>
 
+#include "PictelTestSupport.h"
+
 namespace {
 
 using namespace velkui::pictel;
@@ -17,16 +19,7 @@ using velkcore::RectT;
 using velkui::test::Pixel;
 using velkui::test::PixelProbe;
 using Bytes = std::vector<std::uint8_t>;
-
-template <typename Action>
-int ErrorNumber(Action action) {
-  try {
-    action();
-  } catch (const velkcore::Exception& e) {
-    return e.GetNumber();
-  }
-  return 0;
-}
+using test::ErrorNumber;
 
 struct LayoutCase {
   PixelLayout layout;

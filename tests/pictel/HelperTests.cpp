@@ -10,8 +10,9 @@
 #include <velkui/pictel/Pictel.h>
 #include <velkui/pictel/PictelErrors.h>
 #include <velkui/pictel/PictelImageResourceCache.h>
-#include <velkui/pictel/RedrawDebug.h>
 #include <velkui/test/RecordingSupplier.h>
+
+#include "PictelTestSupport.h"
 
 namespace {
 
@@ -183,13 +184,8 @@ TEST(ColorManagement, ManagingNeedsAManagedVisualAndACallback) {
   RecordingManagedImage managed;
   const OpaqueApplicationData data;
   ColorDestinationProfile profile;
-  try {
-    managed.Manage(profile, data, nullptr);
-    FAIL() << "no error";
-  } catch (const velkcore::Exception& e) {
-    EXPECT_EQ(36, e.GetNumber());
-    EXPECT_EQ(std::string(kErrorNoColorManagementCallbackKey), e.GetKey());
-  }
+  EXPECT_TRUE(test::RaisesDrawingError([&] { managed.Manage(profile, data, nullptr); }, 36,
+                                       kErrorNoColorManagementCallbackKey));
   int calls = 0;
   SetColorManagementCallback(
       [&calls](const ColorDestinationProfile&, const OpaqueApplicationData&, void*) { ++calls; });
@@ -248,13 +244,6 @@ TEST(PictelImageResourceCache, UndecodableBytesAreNotCached) {
   EXPECT_THROW(cache.GetImage(junk, sizeof junk, *platform, "Junk", ImageFileType::kPNG),
                velkcore::Exception);
   EXPECT_EQ(0u, cache.GetSize());
-}
-
-TEST(RedrawDebug, FlashDelayIsProcessWide) {
-  EXPECT_EQ(0u, GetRedrawDebugFlashDelay());
-  SetRedrawDebugFlashDelay(250);
-  EXPECT_EQ(250u, GetRedrawDebugFlashDelay());
-  SetRedrawDebugFlashDelay(0);
 }
 
 }  // namespace

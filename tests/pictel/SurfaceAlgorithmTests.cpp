@@ -10,6 +10,8 @@
 #include <velkui/pictel/PictelHandles.h>
 #include <velkui/test/RecordingSupplier.h>
 
+#include "PictelTestSupport.h"
+
 namespace {
 
 using namespace velkui::pictel;
@@ -237,14 +239,8 @@ class ForeignCache : public CacheInterface {
 
 TEST_F(RecordingTest, DrawingAForeignCacheIsAnError) {
   ForeignCache foreign;
-  try {
-    surface->DrawCache(foreign);
-    FAIL() << "no error";
-  } catch (const velkcore::Exception& e) {
-    EXPECT_EQ(101, e.GetCategory());
-    EXPECT_EQ(30, e.GetNumber());
-    EXPECT_EQ(std::string(kErrorUnspecifiedKey), e.GetKey());
-  }
+  EXPECT_TRUE(
+      test::RaisesDrawingError([&] { surface->DrawCache(foreign); }, 30, kErrorUnspecifiedKey));
 }
 
 TEST_F(RecordingTest, LinearShaderStopsAreCompletedToTheEnd) {
@@ -292,14 +288,9 @@ TEST_F(RecordingTest, ForwardingSurfaceSendsEverythingToItsTarget) {
 }
 
 TEST_F(RecordingTest, ForwardingSurfaceNeedsATarget) {
-  try {
-    BasicSurfaceReferenceInterface reference(supplier.get(), nullptr, false, nullptr);
-    FAIL() << "no error";
-  } catch (const velkcore::Exception& e) {
-    EXPECT_EQ(101, e.GetCategory());
-    EXPECT_EQ(33, e.GetNumber());
-    EXPECT_EQ(std::string(kErrorUnableToCreateReferenceKey), e.GetKey());
-  }
+  EXPECT_TRUE(test::RaisesDrawingError(
+      [&] { BasicSurfaceReferenceInterface reference(supplier.get(), nullptr, false, nullptr); },
+      33, kErrorUnableToCreateReferenceKey));
 }
 
 }  // namespace

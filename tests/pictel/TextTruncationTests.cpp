@@ -1,4 +1,5 @@
 #include <string>
+#include <utility>
 
 #include <gtest/gtest.h>
 
@@ -56,21 +57,15 @@ TEST_F(TruncationTest, PathEllipsisKeepsHeadAndTail) {
 
 TEST(GeneratePathEllipsisString, CountsFromTheTextLength) {
   const UTF16String text = u"ABCDEFGHIJKLMNOPQRST";
+  const std::pair<std::uint32_t, UTF16String> cases[] = {
+      {12, u"ABCDEFG...ST"}, {5, u"...ST"}, {2, u"..."}, {9, u"ABCDEFG..."}, {0, u""}, {20, text},
+      {400, text},
+  };
   UTF16String out = u"stale";
-  GeneratePathEllipsisString(text, 12, out);
-  EXPECT_EQ(u"ABCDEFG...ST", out);
-  GeneratePathEllipsisString(text, 5, out);
-  EXPECT_EQ(u"...ST", out);
-  GeneratePathEllipsisString(text, 2, out);
-  EXPECT_EQ(u"...", out);
-  GeneratePathEllipsisString(text, 9, out);
-  EXPECT_EQ(u"ABCDEFG...", out);
-  GeneratePathEllipsisString(text, 0, out);
-  EXPECT_EQ(u"", out);
-  GeneratePathEllipsisString(text, 20, out);
-  EXPECT_EQ(text, out);
-  GeneratePathEllipsisString(text, 400, out);
-  EXPECT_EQ(text, out);
+  for (const auto& [length, expected] : cases) {
+    GeneratePathEllipsisString(text, length, out);
+    EXPECT_EQ(expected, out) << length;
+  }
 }
 
 TEST(GeneratePathEllipsisString, NeverSplitsASurrogatePair) {

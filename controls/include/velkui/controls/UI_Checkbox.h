@@ -8,10 +8,24 @@
 
 namespace velkui::controls {
 
-// A check box with a label. It keeps its own check value: every press flips
-// it (an unknown, mixed value becomes checked) before the button message goes
-// out. The label may carry a mnemonic ("&Remember").
-class UI_Checkbox : public UI_Button, public UI_TextControlBase {
+// A button that keeps its own check value: every press flips it (an unknown,
+// mixed value becomes checked) before the button message goes out.
+class UI_CheckButton : public UI_Button {
+ public:
+  void SendButtonChangedMessage(ui::ModifierKeys modKeys) override;
+
+  ButtonValue GetCheckValue() const { return checkValue_; }
+  // Sets the check value (and makes the value known); sends nothing.
+  void SetCheckValue(ButtonValue value);
+  bool IsChecked() const { return checkValue_ == kButtonOn; }
+  void SetChecked(bool checked) { SetCheckValue(checked ? kButtonOn : kButtonOff); }
+
+ private:
+  ButtonValue checkValue_ = kButtonOff;
+};
+
+// A check box with a label, which may carry a mnemonic ("&Remember").
+class UI_Checkbox : public UI_CheckButton, public UI_TextControlBase {
  public:
   static constexpr float kDefaultCheckSize = 14.0f;
   static constexpr float kLabelGap = 6.0f;
@@ -22,13 +36,6 @@ class UI_Checkbox : public UI_Button, public UI_TextControlBase {
 
   void UI_Draw(pictel::Pictel* context) const override;
   velkcore::PointT<float> UI_GetRecommendedSize(pictel::Pictel* context) override;
-  void SendButtonChangedMessage(ui::ModifierKeys modKeys) override;
-
-  ButtonValue GetCheckValue() const { return checkValue_; }
-  // Sets the check value (and makes the value known); sends nothing.
-  void SetCheckValue(ButtonValue value);
-  bool IsChecked() const { return checkValue_ == kButtonOn; }
-  void SetChecked(bool checked) { SetCheckValue(checked ? kButtonOn : kButtonOff); }
 
   // Mnemonic markup is processed; GetLabelText answers the text as given.
   void SetLabelText(const velkcore::UTF16String& text) override;
@@ -44,14 +51,13 @@ class UI_Checkbox : public UI_Button, public UI_TextControlBase {
 
  private:
   velkcore::UTF16String displayText_;
-  ButtonValue checkValue_ = kButtonOff;
   float checkSize_ = kDefaultCheckSize;
 };
 
 // A check box drawn with pictures: "<base>" unchecked and "<base>_D" checked
 // (by default the library's "Checkbox" art), or from an image supply
 // function. It can draw like a button, with the body behind the picture.
-class UI_ImageCheckbox : public UI_Button {
+class UI_ImageCheckbox : public UI_CheckButton {
  public:
   UI_ImageCheckbox();
   explicit UI_ImageCheckbox(std::string imageBaseName);
@@ -59,12 +65,6 @@ class UI_ImageCheckbox : public UI_Button {
 
   void UI_Draw(pictel::Pictel* context) const override;
   velkcore::PointT<float> UI_GetRecommendedSize(pictel::Pictel* context) override;
-  void SendButtonChangedMessage(ui::ModifierKeys modKeys) override;
-
-  ButtonValue GetCheckValue() const { return checkValue_; }
-  void SetCheckValue(ButtonValue value);
-  bool IsChecked() const { return checkValue_ == kButtonOn; }
-  void SetChecked(bool checked) { SetCheckValue(checked ? kButtonOn : kButtonOff); }
 
   const std::string& GetImageBaseName() const { return images_.GetBaseName(); }
   void SetImageBaseName(std::string name);
@@ -75,7 +75,6 @@ class UI_ImageCheckbox : public UI_Button {
 
  private:
   ButtonImageSource images_;
-  ButtonValue checkValue_ = kButtonOff;
   bool drawsLikeAButton_ = false;
 };
 

@@ -34,9 +34,12 @@ class LayoutPlacementAlgorithm : public velkcore::RefCountedObject {
 
 using LayoutPlacementAlgorithmP = boost::intrusive_ptr<const LayoutPlacementAlgorithm>;
 
-// The own element to the left of the decorated object.
-class LayoutPlacement_LeftOfDO : public LayoutPlacementAlgorithm {
+// The own element at one end of the area along one axis: what the four placements below share.
+class LayoutPlacementAtSide : public LayoutPlacementAlgorithm {
  public:
+  enum class Axis { kHorizontal, kVertical };
+  enum class End { kStart, kEnd };
+
   void GetRects(const velkcore::RectT<float>& area, const velkcore::PointT<float>& ownSize,
                 const velkcore::PointT<float>& decoratedSize, velkcore::RectT<float>& ownRect,
                 velkcore::RectT<float>& decoratedRect,
@@ -44,45 +47,40 @@ class LayoutPlacement_LeftOfDO : public LayoutPlacementAlgorithm {
   velkcore::PointT<float> GetCombinedSize(
       const velkcore::PointT<float>& ownSize,
       const velkcore::PointT<float>& decoratedSize) const override;
+
+ protected:
+  LayoutPlacementAtSide(Axis axis, End end) : axis_(axis), end_(end) {}
+
+ private:
+  Axis axis_;
+  End end_;
+};
+
+// The own element to the left of the decorated object.
+class LayoutPlacement_LeftOfDO : public LayoutPlacementAtSide {
+ public:
+  LayoutPlacement_LeftOfDO() : LayoutPlacementAtSide(Axis::kHorizontal, End::kStart) {}
   static const LayoutPlacementAlgorithmP& GetSharedPtr();
 };
 
 // The own element to the right of the decorated object.
-class LayoutPlacement_RightOfDO : public LayoutPlacementAlgorithm {
+class LayoutPlacement_RightOfDO : public LayoutPlacementAtSide {
  public:
-  void GetRects(const velkcore::RectT<float>& area, const velkcore::PointT<float>& ownSize,
-                const velkcore::PointT<float>& decoratedSize, velkcore::RectT<float>& ownRect,
-                velkcore::RectT<float>& decoratedRect,
-                const ExtraSpaceAlgorithmP& extraSpace) const override;
-  velkcore::PointT<float> GetCombinedSize(
-      const velkcore::PointT<float>& ownSize,
-      const velkcore::PointT<float>& decoratedSize) const override;
+  LayoutPlacement_RightOfDO() : LayoutPlacementAtSide(Axis::kHorizontal, End::kEnd) {}
   static const LayoutPlacementAlgorithmP& GetSharedPtr();
 };
 
 // The own element above the decorated object.
-class LayoutPlacement_AboveDO : public LayoutPlacementAlgorithm {
+class LayoutPlacement_AboveDO : public LayoutPlacementAtSide {
  public:
-  void GetRects(const velkcore::RectT<float>& area, const velkcore::PointT<float>& ownSize,
-                const velkcore::PointT<float>& decoratedSize, velkcore::RectT<float>& ownRect,
-                velkcore::RectT<float>& decoratedRect,
-                const ExtraSpaceAlgorithmP& extraSpace) const override;
-  velkcore::PointT<float> GetCombinedSize(
-      const velkcore::PointT<float>& ownSize,
-      const velkcore::PointT<float>& decoratedSize) const override;
+  LayoutPlacement_AboveDO() : LayoutPlacementAtSide(Axis::kVertical, End::kStart) {}
   static const LayoutPlacementAlgorithmP& GetSharedPtr();
 };
 
 // The own element below the decorated object.
-class LayoutPlacement_BelowDO : public LayoutPlacementAlgorithm {
+class LayoutPlacement_BelowDO : public LayoutPlacementAtSide {
  public:
-  void GetRects(const velkcore::RectT<float>& area, const velkcore::PointT<float>& ownSize,
-                const velkcore::PointT<float>& decoratedSize, velkcore::RectT<float>& ownRect,
-                velkcore::RectT<float>& decoratedRect,
-                const ExtraSpaceAlgorithmP& extraSpace) const override;
-  velkcore::PointT<float> GetCombinedSize(
-      const velkcore::PointT<float>& ownSize,
-      const velkcore::PointT<float>& decoratedSize) const override;
+  LayoutPlacement_BelowDO() : LayoutPlacementAtSide(Axis::kVertical, End::kEnd) {}
   static const LayoutPlacementAlgorithmP& GetSharedPtr();
 };
 

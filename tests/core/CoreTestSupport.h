@@ -1,0 +1,39 @@
+#pragma once
+
+#include <functional>
+#include <optional>
+#include <string>
+
+#include <gtest/gtest.h>
+
+#include <velkcore/Error.h>
+
+namespace velkcore_test {
+
+// The library error `action` raised, if any.
+inline std::optional<velkcore::Exception> ErrorOf(const std::function<void()>& action) {
+  try {
+    action();
+  } catch (const velkcore::Exception& e) {
+    return e;
+  }
+  return std::nullopt;
+}
+
+// Whether `action` raised the error `key` with a message containing `message` (all of it when
+// `whole`).
+inline ::testing::AssertionResult Raises(const std::function<void()>& action, std::string_view key,
+                                         const std::string& message = "", bool whole = false) {
+  const auto error = ErrorOf(action);
+  if (!error) return ::testing::AssertionFailure() << "no error";
+  const std::string what = error->what();
+  if (!key.empty() && error->GetKey() != key) {
+    return ::testing::AssertionFailure() << "key " << error->GetKey() << ": " << what;
+  }
+  if (whole ? what != message : what.find(message) == std::string::npos) {
+    return ::testing::AssertionFailure() << "message: " << what;
+  }
+  return ::testing::AssertionSuccess();
+}
+
+}  // namespace velkcore_test
