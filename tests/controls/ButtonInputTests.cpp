@@ -76,16 +76,16 @@ TEST_F(ButtonInputTest, AToggleFlipsItsValueOnEachClick) {
                                 "changed(0)", "continue(0)", "finish"}));
 }
 
-TEST_F(ButtonInputTest, NotificationOnMouseDownFiresOnThePressOnly) {
+TEST_F(ButtonInputTest, NotificationOnMouseDownOrUpFiresOnThatEventOnly) {
   button->SetNotificationOnMouseDown(true);
   Press(20, 20, ui::kModifierAlt);
   EXPECT_EQ(log.Entries(), Log{"changed(16)"});
   EXPECT_FALSE(manager.HasInputCapture());
   Release(20, 20);
   EXPECT_EQ(log.Entries(), Log{"changed(16)"});
-}
 
-TEST_F(ButtonInputTest, NotificationOnMouseUpFiresOnAPlainRelease) {
+  log.Clear();
+  button->SetNotificationOnMouseDown(false);
   button->SetNotificationOnMouseUp(true);
   Release(20, 20);
   EXPECT_EQ(log.Entries(), Log{"changed(0)"});

@@ -16,6 +16,7 @@
 #include <velkui/controls/ControlClock.h>
 #include <velkui/controls/ControlMessages.h>
 #include <velkui/controls/UI_InteractiveControlView.h>
+#include <velkui/test/MessageLog.h>
 #include <velkui/ui/KeyboardEvent.h>
 #include <velkui/ui/MouseEvent.h>
 #include <velkui/ui/Theme.h>
@@ -52,72 +53,7 @@ class TestRoot : public ui::UI_SubView {
   std::unique_ptr<ui::UI_NodeTimerManager> timers_;
 };
 
-// Records the messages of controls as short strings, in order.
-class MessageLog {
- public:
-  void Watch(UI_ControlView& control) {
-    Keep(
-        control,
-        [this](ui::MessageT<ui::UI_Node>* m) {
-          if (auto* button = dynamic_cast<UI_ButtonChangedMessage*>(m)) {
-            Add(Name(m) + "changed(" + std::to_string(button->GetModKeys().Get()) + ")");
-          } else {
-            Add(Name(m) + "changed");
-          }
-        },
-        false);
-    if (auto* interactive = dynamic_cast<UI_InteractiveControlView*>(&control)) {
-      auto f = std::make_shared<ControlCallback>([this](ui::MessageT<ui::UI_Node>* m) {
-        auto* step = dynamic_cast<UI_InteractiveControlChangedMessage*>(m);
-        static const char* const kNames[] = {"begin", "continue", "finish", "cancel"};
-        std::string text = Name(m) + kNames[step->GetChangeMessage()];
-        if (step->GetChangeMessage() == kContinueChange) {
-          text += "(" + std::to_string(step->GetModKeys().Get()) + ")";
-        }
-        Add(text);
-      });
-      interactive->NotifyWhenChangedInteractively(f);
-      callbacks_.push_back(f);
-    }
-  }
-  void WatchHover(UI_ControlView& control) {
-    Keep(
-        control,
-        [this](ui::MessageT<ui::UI_Node>* m) {
-          auto* hover = dynamic_cast<UI_HoverMessage*>(m);
-          Add(Name(m) + "hover(" + std::to_string(hover->GetMouseEvent().GetAction()) + ")");
-        },
-        true);
-  }
-  // With a prefix per control ("name:"), for logs of several controls.
-  void SetPrefixed(bool prefixed) { prefixed_ = prefixed; }
-  const std::vector<std::string>& Entries() const { return entries_; }
-  void Clear() { entries_.clear(); }
-  std::function<void()> onAdd;
-
- private:
-  void Keep(UI_ControlView& control, ControlCallback f, bool hover) {
-    auto p = std::make_shared<ControlCallback>(std::move(f));
-    if (hover) {
-      control.NotifyHover(p);
-    } else {
-      control.NotifyWhenChanged(p);
-    }
-    callbacks_.push_back(p);
-  }
-  std::string Name(ui::MessageT<ui::UI_Node>* m) const {
-    return prefixed_ ? m->GetSubject()->UI_GetNodeID() + ":" : std::string();
-  }
-  void Add(std::string entry) {
-    entries_.push_back(std::move(entry));
-    if (onAdd) onAdd();
-  }
-
-  std::vector<std::string> entries_;
-  std::vector<ControlCallbackP> callbacks_;
-  bool prefixed_ = false;
-};
-
+using velkui::test::MessageLog;
 using Log = std::vector<std::string>;
 
 class ControlTest : public ::testing::Test {

@@ -3,14 +3,7 @@
 #include <velkcore/Error.h>
 #include <velkui/controls/ControlAlignment.h>
 #include <velkui/controls/PopupToggler.h>
-#include <velkui/controls/UI_Checkbox.h>
 #include <velkui/controls/UI_ContainerControlView.h>
-#include <velkui/controls/UI_DisclosureTriangleButton.h>
-#include <velkui/controls/UI_OwnerDrawButton.h>
-#include <velkui/controls/UI_PictureButton.h>
-#include <velkui/controls/UI_PictureTextButton.h>
-#include <velkui/controls/UI_RadioGroup.h>
-#include <velkui/controls/UI_StaticText.h>
 #include <velkui/controls/UI_TextButton.h>
 
 #include "ControlTestSupport.h"
@@ -49,30 +42,6 @@ class ControlViewTest : public ControlTest {
     return p;
   }
 };
-
-TEST_F(ControlViewTest, EachClassNamesItself) {
-  EXPECT_EQ(velkcore::MakeIntrusive<UI_ControlView>()->UI_GetNodeID(), "UI_ControlView");
-  EXPECT_EQ(velkcore::MakeIntrusive<UI_InteractiveControlView>()->UI_GetNodeID(),
-            "UI_InteractiveControlView");
-  EXPECT_EQ(velkcore::MakeIntrusive<UI_ContainerControlView>()->UI_GetNodeID(),
-            "UI_ContainerControlView");
-  EXPECT_EQ(velkcore::MakeIntrusive<UI_TextButton>()->UI_GetNodeID(), "UI_TextButton");
-  EXPECT_EQ(velkcore::MakeIntrusive<UI_PictureButton>()->UI_GetNodeID(), "UI_PictureButton");
-  EXPECT_EQ(velkcore::MakeIntrusive<UI_PictureTextButton>()->UI_GetNodeID(),
-            "UI_PictureTextButton");
-  EXPECT_EQ(velkcore::MakeIntrusive<UI_OwnerDrawButton>()->UI_GetNodeID(), "UI_OwnerDrawButton");
-  EXPECT_EQ(velkcore::MakeIntrusive<UI_DisclosureTriangleButton>()->UI_GetNodeID(),
-            "UI_DisclosureTriangleButton");
-  EXPECT_EQ(velkcore::MakeIntrusive<UI_Checkbox>()->UI_GetNodeID(), "UI_Checkbox");
-  EXPECT_EQ(velkcore::MakeIntrusive<UI_ImageCheckbox>()->UI_GetNodeID(), "UI_ImageCheckbox");
-  EXPECT_EQ(velkcore::MakeIntrusive<UI_RadioButton>()->UI_GetNodeID(), "UI_RadioButton");
-  EXPECT_EQ(velkcore::MakeIntrusive<UI_ImageRadioButton>()->UI_GetNodeID(), "UI_ImageRadioButton");
-  EXPECT_EQ(velkcore::MakeIntrusive<UI_RadioGroup>()->UI_GetNodeID(), "UI_RadioGroup");
-  EXPECT_EQ(velkcore::MakeIntrusive<UI_LockButton>()->UI_GetNodeID(), "UI_LockButton");
-  EXPECT_EQ(velkcore::MakeIntrusive<UI_LinkButton>()->UI_GetNodeID(), "UI_LinkButton");
-  EXPECT_EQ(velkcore::MakeIntrusive<UI_StaticText>()->UI_GetNodeID(), "UI_StaticText");
-  EXPECT_EQ(velkcore::MakeIntrusive<UI_Divider>()->UI_GetNodeID(), "UI_Divider");
-}
 
 TEST_F(ControlViewTest, ValueUnknownSettersActOnlyOnAChange) {
   EXPECT_TRUE(control->IsValueUnknown());
@@ -180,10 +149,6 @@ TEST_F(ControlViewTest, MessagesCheckTheirSubject) {
   } catch (const velkcore::Exception& e) {
     EXPECT_EQ(e.GetNumber(), velkcore::kInvalidTypeConversionNumber);
   }
-  const UI_PictureSupplyMessage supply(control.get(), kControlStateDown, ui::kModifierAlt);
-  EXPECT_EQ(supply.GetControl(), control.get());
-  EXPECT_EQ(supply.GetImage(), nullptr);
-  EXPECT_EQ(supply.GetStateFlags().Get(), kControlStateDown);
 }
 
 TEST_F(ControlViewTest, ForwardedMessagesComeFromTheParentControl) {
@@ -283,11 +248,6 @@ TEST_F(ControlViewTest, ThePopupTogglerIgnoresTheClickThatClosedThePopup) {
 }
 
 TEST_F(ControlViewTest, DrawButtonParametersComeFromTheButton) {
-  const DrawButtonParameters defaults(nullptr);
-  EXPECT_TRUE(defaults.GetDrawContainer());
-  EXPECT_EQ(defaults.GetStrokeSize(), 1.0f);
-  EXPECT_EQ(defaults.GetDrawButtonFace(), nullptr);
-
   auto button = Add<UI_TextButton>({5, 6, 70, 20}, u"Go");
   button->SetDefaultAppearance(true);
   button->SetStrokeSizes({1.5f, 2.5f});
@@ -301,9 +261,6 @@ TEST_F(ControlViewTest, DrawButtonParametersComeFromTheButton) {
   EXPECT_EQ(p.GetRectF(), (RectT<float>{0, 0, 70, 20}));
   EXPECT_EQ(p.GetOffset(), (PointT<float>{1, 1}));
   EXPECT_TRUE(p.GetControlState().IsSet(kControlStateDown));
-  p.SetDefaults();
-  EXPECT_FALSE(p.GetDefaultAppearance());
-  EXPECT_EQ(p.GetStrokeSize(), 1.0f);
 }
 
 }  // namespace

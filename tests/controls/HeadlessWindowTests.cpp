@@ -87,17 +87,6 @@ TEST_F(HeadlessWindowTest, AClickAndTheSpaceBarPressTheButton) {
   EXPECT_EQ(plainLog.Entries().size(), 8u);
 }
 
-TEST_F(HeadlessWindowTest, DraggingOffTheButtonAndReleasingCancels) {
-  PointAt(30, 30);
-  headless.PressButton(1);
-  headless.ProcessEvents();
-  PointAt(250, 150);
-  EXPECT_FALSE(button->GetDownState());
-  headless.ReleaseButton(1);
-  headless.ProcessEvents();
-  EXPECT_EQ(log.Entries(), (Log{"begin", "cancel"}));
-}
-
 TEST_F(HeadlessWindowTest, TheTriangleTwirlsOnTheVirtualClock) {
   auto triangle = velkcore::MakeIntrusive<UI_DisclosureTriangleButton>(u"More");
   triangle->UI_SetLocalRectF({20, 60, 80, 20});

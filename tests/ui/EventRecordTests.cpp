@@ -41,11 +41,9 @@ TEST(MouseEventTest, PredicatesReadActionButtonAndCount) {
 }
 
 TEST(MouseEventTest, WheelDeltasBecomeNotches) {
-  EXPECT_EQ(WheelDeltaToNotches(60), 1);
-  EXPECT_EQ(WheelDeltaToNotches(-60), -1);
-  EXPECT_EQ(WheelDeltaToNotches(240), 2);
-  EXPECT_EQ(WheelDeltaToNotches(-359), -2);
-  EXPECT_EQ(WheelDeltaToNotches(0), 0);
+  const std::pair<std::int32_t, std::int32_t> rows[] = {{120, 1},   {60, 1},    {-60, -1}, {240, 2},
+                                                        {-359, -2}, {-360, -3}, {0, 0}};
+  for (const auto& [delta, notches] : rows) EXPECT_EQ(WheelDeltaToNotches(delta), notches) << delta;
 }
 
 // ---- Click counting ----
@@ -69,20 +67,11 @@ class ClickCounterTest : public ::testing::Test {
   }
 };
 
-TEST_F(ClickCounterTest, ThePlatformsDoubleClickMakesTheSecondReleaseADoubleClick) {
+TEST_F(ClickCounterTest, ThePlatformsDoubleClickCountsOnUntilTheChainBreaks) {
   EXPECT_EQ(Press(), 1);
   EXPECT_EQ(Release(), 1);
   EXPECT_EQ(Press(2), 2);  // the platform's double-click message
-  const std::int32_t count = Release();
-  EXPECT_EQ(count, 2);
-  EXPECT_TRUE(Mouse(MouseEvent::kButtonUp, 0, 0, 1, count).IsLeftButtonDoubleClick());
-}
-
-TEST_F(ClickCounterTest, FurtherPressesCountOnUntilTheChainBreaks) {
-  Press();
-  Release();
-  Press(2);
-  Release();
+  EXPECT_EQ(Release(), 2);
   EXPECT_EQ(Press(), 3);
   EXPECT_EQ(Move({11, 12}), 3);  // within half the 4 x 4 rectangle
   EXPECT_EQ(Release(), 3);

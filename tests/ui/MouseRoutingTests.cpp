@@ -11,18 +11,13 @@ namespace {
 
 // root (0,0 400x400) > parent (100,100 200x200) > leaf (10,10 50x50);
 // root > sibling (300,0 50x50).
-class MouseRoutingTest : public ::testing::Test {
+class MouseRoutingTest : public NodeTest<> {
  protected:
-  ScopedManager<FakeManager> manager;
-  std::shared_ptr<EventLog> log = std::make_shared<EventLog>();
   LoggingViewP root = View("root", nullptr, {0, 0, 400, 400});
   LoggingViewP parent = View("parent", root.get(), {100, 100, 200, 200});
   LoggingViewP leaf = View("leaf", parent.get(), {10, 10, 50, 50});
   LoggingViewP sibling = View("sibling", root.get(), {300, 0, 50, 50});
 
-  LoggingViewP View(const std::string& name, UI_Node* under, RectT<float> frame) {
-    return MakeView(under, frame, name, log);
-  }
   bool Click(float x, float y, UI_Node* at = nullptr) {
     log->clear();
     return (at ? at : root.get())
@@ -30,12 +25,6 @@ class MouseRoutingTest : public ::testing::Test {
   }
   void MoveTo(float x, float y) {
     root->UI_UpdateMouseOverState(Mouse(MouseEvent::kMouseOverUpdate, x, y, 0, 0));
-  }
-  std::vector<std::string> Only(const std::string& what) const {
-    std::vector<std::string> out;
-    std::copy_if(log->begin(), log->end(), std::back_inserter(out),
-                 [&](const std::string& s) { return s.find(what) != std::string::npos; });
-    return out;
   }
 };
 

@@ -26,17 +26,15 @@ RectT<float> DeviceRect(const RecordedCall& call) {
   return {std::min(a.x, b.x), std::min(a.y, b.y), std::abs(b.x - a.x), std::abs(b.y - a.y)};
 }
 
-class NodeDrawTest : public ::testing::Test {
+class NodeDrawTest : public NodeTest<UI_NodeManager> {
  protected:
-  ScopedManager<> manager;
-  std::shared_ptr<EventLog> log = std::make_shared<EventLog>();
   boost::intrusive_ptr<RecordingSupplier> supplier = velkcore::MakeIntrusive<RecordingSupplier>();
   boost::intrusive_ptr<pictel::SurfaceInterface> surface = supplier->NewSurface(400, 400, true);
   pictel::Pictel context{supplier.get(), surface.get()};
   LoggingViewP root = MakeView(nullptr, {0, 0, 400, 400}, "root", log);
 
   LoggingViewP View(const std::string& name, UI_Node* parent, RectT<float> frame) {
-    auto view = MakeView(parent, frame, name, log);
+    auto view = NodeTest::View(name, parent, frame);
     view->paints = true;
     return view;
   }
@@ -46,12 +44,7 @@ class NodeDrawTest : public ::testing::Test {
     supplier->GetLog().Clear();
     root->UI_DispatchDrawFromRoot({1, 1, 1, 1}, &context, true);
   }
-  std::vector<std::string> Draws() const {
-    std::vector<std::string> draws;
-    std::copy_if(log->begin(), log->end(), std::back_inserter(draws),
-                 [](const std::string& s) { return s.ends_with(":draw"); });
-    return draws;
-  }
+  EventLog Draws() const { return Only(":draw"); }
   // The calls of the window's surface (not of cache bitmaps).
   std::vector<RecordedCall> Calls(const std::string& name) const {
     std::vector<RecordedCall> calls;

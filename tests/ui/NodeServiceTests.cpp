@@ -7,14 +7,7 @@
 namespace velkui::ui::test {
 namespace {
 
-class NodeServiceTest : public ::testing::Test {
- protected:
-  ScopedManager<FakeManager> manager;
-  std::shared_ptr<EventLog> log = std::make_shared<EventLog>();
-  LoggingViewP View(const std::string& name, UI_Node* parent, RectT<float> frame) {
-    return MakeView(parent, frame, name, log);
-  }
-};
+using NodeServiceTest = NodeTest<>;
 
 TEST_F(NodeServiceTest, TimerFunctionsAreAskedInOrderUntilOneAnswers) {
   auto node = View("node", nullptr, {0, 0, 10, 10});

@@ -3,6 +3,7 @@
 // Helpers shared by the node and routing tests: a manager installed for one
 // test and a sub-view that logs its hooks.
 
+#include <algorithm>
 #include <cmath>
 #include <functional>
 #include <memory>
@@ -10,6 +11,8 @@
 #include <string>
 #include <utility>
 #include <vector>
+
+#include <gtest/gtest.h>
 
 #include <velkcore/Geometry.h>
 #include <velkui/pictel/Pictel.h>
@@ -239,6 +242,26 @@ boost::intrusive_ptr<View> MakeView(UI_Node* parent, const RectT<float>& frame, 
   if (parent != nullptr) parent->ChildPushBack(view);
   return view;
 }
+
+// A manager of its own, a shared log and logging views for one test.
+template <typename Manager = FakeManager>
+class NodeTest : public ::testing::Test {
+ protected:
+  ScopedManager<Manager> manager;
+  std::shared_ptr<EventLog> log = std::make_shared<EventLog>();
+
+  LoggingViewP View(const std::string& name, UI_Node* under = nullptr,
+                    RectT<float> frame = {0, 0, 10, 10}) {
+    return MakeView(under, frame, name, log);
+  }
+  // The log entries that contain `what`.
+  EventLog Only(const std::string& what) const {
+    EventLog out;
+    std::copy_if(log->begin(), log->end(), std::back_inserter(out),
+                 [&](const std::string& s) { return s.find(what) != std::string::npos; });
+    return out;
+  }
+};
 
 inline MouseEvent Mouse(MouseEvent::Action action, float x, float y, std::int32_t button = 1,
                         std::int32_t count = 1, ModifierKeys modifiers = {}) {

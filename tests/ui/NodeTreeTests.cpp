@@ -12,16 +12,7 @@
 namespace velkui::ui::test {
 namespace {
 
-class NodeTreeTest : public ::testing::Test {
- protected:
-  ScopedManager<> manager;
-  std::shared_ptr<EventLog> log = std::make_shared<EventLog>();
-
-  LoggingViewP View(const std::string& name, UI_Node* parent = nullptr,
-                    RectT<float> frame = {0, 0, 10, 10}) {
-    return MakeView(parent, frame, name, log);
-  }
-};
+using NodeTreeTest = NodeTest<UI_NodeManager>;
 
 void ExpectIndicesMatchPositions(const UI_Container& container) {
   for (std::size_t i = 0; i < container.ChildSize(); ++i) {
@@ -392,22 +383,19 @@ TEST_F(NodeTreeTest, HitTestingUsesTheChildsOwnCoordinatesAndTheTopMostChild) {
   EXPECT_EQ(position->get(), scaled.get());
   EXPECT_EQ(p, (PointT<float>{5, 5}));
 
+  // A recursive hit finds the deepest node, in its own coordinates.
+  auto inner = View("inner", below.get(), {5, 5, 10, 10});
+  p = {110, 110};
+  std::tie(found, position) = root->GetChildHit(true, false, &p);
+  ASSERT_TRUE(found);
+  EXPECT_EQ(position->get(), inner.get());
+  EXPECT_EQ(p, (PointT<float>{5, 5}));
+
   // A degenerate scale is skipped, not an error.
   scaled->UI_SetMatrix({0, 0, 0, 2});
   p = {300, 610};
   EXPECT_NO_THROW(std::tie(found, position) = root->GetChildHit(false, false, &p));
   EXPECT_FALSE(found);
-}
-
-TEST_F(NodeTreeTest, RecursiveHitFindsTheDeepestNode) {
-  auto root = View("root", nullptr, {0, 0, 500, 500});
-  auto parent = View("parent", root.get(), {100, 100, 100, 100});
-  auto child = View("child", parent.get(), {10, 10, 20, 20});
-  PointT<float> p{115, 115};
-  const auto [found, position] = root->GetChildHit(true, false, &p);
-  ASSERT_TRUE(found);
-  EXPECT_EQ(position->get(), child.get());
-  EXPECT_EQ(p, (PointT<float>{5, 5}));
 }
 
 class SometimesShownView : public LoggingView {

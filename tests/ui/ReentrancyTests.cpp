@@ -13,10 +13,8 @@ namespace velkui::ui::test {
 namespace {
 
 // root > parent > leaf, root > sibling; only the tree (and `root`) holds them.
-class ReentrancyTest : public ::testing::Test {
+class ReentrancyTest : public NodeTest<> {
  protected:
-  ScopedManager<FakeManager> manager;
-  std::shared_ptr<EventLog> log = std::make_shared<EventLog>();
   LoggingViewP root = MakeView(nullptr, {0, 0, 400, 400}, "root", log);
   LoggingView* parent = Add("parent", root.get(), {100, 100, 200, 200});
   LoggingView* leaf = Add("leaf", parent, {10, 10, 50, 50});
@@ -28,12 +26,6 @@ class ReentrancyTest : public ::testing::Test {
   void ClickLeaf() {
     log->clear();
     root->UI_DispatchMouseEvent(Mouse(MouseEvent::kButtonDown, 125, 130), true);
-  }
-  std::vector<std::string> Only(const std::string& what) const {
-    std::vector<std::string> out;
-    std::copy_if(log->begin(), log->end(), std::back_inserter(out),
-                 [&](const std::string& s) { return s.find(what) != std::string::npos; });
-    return out;
   }
   static void Detach(UI_Node* node) {
     if (UI_Container* container = node->UI_GetParentContainer()) container->ChildRemove(node);

@@ -38,10 +38,8 @@ class TrackedTimerData : public UI_NodeTimerData {
   std::vector<std::string>* log_;
 };
 
-class TimerTest : public ::testing::Test {
+class TimerTest : public NodeTest<UI_NodeManager> {
  protected:
-  ScopedManager<> manager;
-  std::shared_ptr<EventLog> log = std::make_shared<EventLog>();
   boost::intrusive_ptr<TimerRoot> root =
       MakeView<TimerRoot>(nullptr, {0, 0, 200, 200}, "root", log);
   LoggingViewP node = MakeView(root.get(), {10, 10, 50, 50}, "node", log);

@@ -6,6 +6,7 @@
 
 #include <gtest/gtest.h>
 
+#include <velkui/test/InputRecorder.h>
 #include <velkui/ui/HeadlessPlatform.h>
 #include <velkui/ui/OS_Window.h>
 #include <velkui/ui/PlatformSession.h>
@@ -52,39 +53,8 @@ class WindowTest : public ::testing::Test {
 
 namespace velkui::ui::test {
 
-// A view that keeps a copy of every mouse and keyboard event it is offered.
-class RecordingView : public LoggingView {
- public:
-  using LoggingView::LoggingView;
-
-  std::vector<MouseEvent> mouse;
-  std::vector<KeyboardEvent> keys;
-
-  bool UI_DoMouseEvent(UI_Node* target, const MouseEvent& event) override {
-    mouse.push_back(event);
-    return LoggingView::UI_DoMouseEvent(target, event);
-  }
-  bool UI_DoKeyboardEvent(UI_Node* target, const KeyboardEvent& event) override {
-    keys.push_back(event);
-    return LoggingView::UI_DoKeyboardEvent(target, event);
-  }
-  // The events of one action only.
-  std::vector<MouseEvent> MouseOf(MouseEvent::Action action) const {
-    std::vector<MouseEvent> found;
-    for (const MouseEvent& e : mouse) {
-      if (e.GetAction() == action) found.push_back(e);
-    }
-    return found;
-  }
-  std::u16string Typed() const {
-    std::u16string text;
-    for (const KeyboardEvent& e : keys) {
-      if (e.IsActionKeyChar() && e.GetNumCharacters() > 0) text += e.GetCharacter(0);
-    }
-    return text;
-  }
-};
-
+// A logging view that also keeps a copy of every mouse and keyboard event.
+using RecordingView = velkui::test::InputRecorder<LoggingView>;
 using RecordingViewP = boost::intrusive_ptr<RecordingView>;
 
 }  // namespace velkui::ui::test

@@ -19,8 +19,8 @@
 #include <exception>
 #include <thread>
 
-#include <velkui/controls/ControlMessages.h>
 #include <velkui/controls/UI_TextButton.h>
+#include <velkui/test/MessageLog.h>
 #include <velkui/ui/Theme.h>
 #include <velkui/ui/UI_Dialog.h>
 
@@ -35,41 +35,14 @@ using UI_TextButtonP = boost::intrusive_ptr<UI_TextButton>;
 
 constexpr pictel::ColorRGBA kPaper{0.93f, 0.93f, 0.93f, 1};
 
-// The messages of buttons as "name:begin", "name:changed(modifiers)", ...
-class ButtonLog {
- public:
-  void Watch(UI_TextButton& button, const std::string& name) {
-    auto changed = std::make_shared<controls::ControlCallback>([this, name](MessageT<UI_Node>* m) {
-      const auto* message = dynamic_cast<controls::UI_ButtonChangedMessage*>(m);
-      const int keys = message != nullptr ? message->GetModKeys().Get() : -1;
-      entries.push_back(name + ":changed(" + std::to_string(keys) + ")");
-      if (onChanged) onChanged(name);
-    });
-    button.NotifyWhenChanged(changed);
-    callbacks_.push_back(changed);
-    auto step = std::make_shared<controls::ControlCallback>([this, name](MessageT<UI_Node>* m) {
-      const auto* s = dynamic_cast<controls::UI_InteractiveControlChangedMessage*>(m);
-      static const char* const kSteps[] = {"begin", "continue", "finish", "cancel"};
-      std::string entry = name + ":" + kSteps[s->GetChangeMessage()];
-      if (s->GetChangeMessage() == controls::kContinueChange) {
-        entry += "(" + std::to_string(s->GetModKeys().Get()) + ")";
-      }
-      entries.push_back(entry);
-    });
-    button.NotifyWhenChangedInteractively(step);
-    callbacks_.push_back(step);
-  }
-  std::vector<std::string> entries;
-  std::function<void(const std::string&)> onChanged;
-
- private:
-  std::vector<controls::ControlCallbackP> callbacks_;
-};
-
+using velkui::test::MessageLog;
 using Log = std::vector<std::string>;
 
-UI_TextButtonP AddButton(UI_Node& parent, const std::u16string& text, const RectT<float>& frame) {
+// A shown button named `name` (in the message log).
+UI_TextButtonP AddButton(UI_Node& parent, const std::u16string& text, const RectT<float>& frame,
+                         const std::string& name) {
   auto button = velkcore::MakeIntrusive<UI_TextButton>(text);
+  button->UI_SetNodeID(name);
   button->UI_SetLocalRectF(frame);
   button->UI_Show(true);
   parent.ChildPushBack(button);
@@ -83,11 +56,12 @@ class X11ButtonTest : public X11Test {
   X11ButtonTest() {
     window = MakeWindow({120, 120, 400, 160}, kStyleOverlappedWindow);
     background = AddView(*window, {0, 0, 400, 160}, kPaper, "background");
-    apply = AddButton(*background, u"Apply", {20, 20, 100, 28});
-    loop = AddButton(*background, u"Loop", {140, 20, 100, 28});
+    log.SetPrefixed(true);
+    apply = AddButton(*background, u"Apply", {20, 20, 100, 28}, "apply");
+    loop = AddButton(*background, u"Loop", {140, 20, 100, 28}, "loop");
     loop->SetSpringLoaded(false);
-    log.Watch(*apply, "apply");
-    log.Watch(*loop, "loop");
+    log.Watch(*apply);
+    log.Watch(*loop);
     PumpFor(0.05);
   }
   // Client coordinates of a point `dx`, `dy` into `button`.
@@ -97,14 +71,14 @@ class X11ButtonTest : public X11Test {
                   static_cast<std::int32_t>(r.top) + dy);
   }
   bool LogEndsWith(const std::string& entry) {
-    return PumpUntil([&] { return !log.entries.empty() && log.entries.back() == entry; });
+    return PumpUntil([&] { return !log.Entries().empty() && log.Entries().back() == entry; });
   }
 
   OS_WindowP window;
   RecordingViewP background;
   UI_TextButtonP apply;
   UI_TextButtonP loop;
-  ButtonLog log;
+  MessageLog log;
 };
 
 TEST_F(X11ButtonTest, AClickSendsBeginChangedContinueFinishWithTheModifiersHeld) {
@@ -115,23 +89,24 @@ TEST_F(X11ButtonTest, AClickSendsBeginChangedContinueFinishWithTheModifiersHeld)
   EXPECT_EQ(x11.GetCapture(), Handle(*window)) << "the press holds the pointer";
   x11.InjectButton(1, false);
   ASSERT_TRUE(LogEndsWith("apply:finish"));
-  EXPECT_EQ(log.entries,
+  EXPECT_EQ(log.Entries(),
             (Log{"apply:begin", "apply:changed(0)", "apply:continue(0)", "apply:finish"}));
   EXPECT_FALSE(apply->GetDownState());
   EXPECT_EQ(x11.GetCapture(), kNoPlatformWindow);
 
   // Shift held through the click reaches the messages; a toggle flips.
-  log.entries.clear();
+  log.Clear();
   x11.InjectKey(vk::kShift, false, true);
   x11.InjectPointerMove(At(*loop));
   x11.InjectButton(1, true);
   x11.InjectButton(1, false);
   x11.InjectKey(vk::kShift, false, false);
   ASSERT_TRUE(LogEndsWith("loop:finish"));
-  EXPECT_EQ(log.entries, (Log{"loop:begin", "loop:changed(2)", "loop:continue(2)", "loop:finish"}));
+  EXPECT_EQ(log.Entries(),
+            (Log{"loop:begin", "loop:changed(2)", "loop:continue(2)", "loop:finish"}));
   EXPECT_EQ(loop->GetValue(), 1);
   Click(*window, 190, 34);
-  ASSERT_TRUE(PumpUntil([&] { return log.entries.size() == 8; }));
+  ASSERT_TRUE(PumpUntil([&] { return log.Entries().size() == 8; }));
   EXPECT_EQ(loop->GetValue(), 0);
   EXPECT_FALSE(loop->GetDownState());
 }
@@ -151,7 +126,7 @@ TEST_F(X11ButtonTest, DraggingOffAndBackFollowsThePointerAndAReleaseOutsideTheWi
   ASSERT_TRUE(PumpUntil([&] { return !apply->GetDownState(); }));
   x11.InjectButton(1, false);
   ASSERT_TRUE(LogEndsWith("apply:cancel"));
-  EXPECT_EQ(log.entries, (Log{"apply:begin", "apply:cancel"}));
+  EXPECT_EQ(log.Entries(), (Log{"apply:begin", "apply:cancel"}));
   EXPECT_FALSE(apply->GetDownState());
   EXPECT_EQ(x11.GetCapture(), kNoPlatformWindow);
 }
@@ -163,19 +138,19 @@ TEST_F(X11ButtonTest, HeldDownTheButtonRepeatsOnTheLoopsTimersAndTheSpaceBarPres
   ASSERT_TRUE(LogEndsWith("apply:continue(0)"));
   x11.InjectButton(1, false);
   ASSERT_TRUE(LogEndsWith("apply:finish"));
-  const auto changed = std::find(log.entries.begin(), log.entries.end(), "apply:changed(0)");
-  ASSERT_NE(changed, log.entries.end());
-  EXPECT_EQ(log.entries.front(), "apply:begin");
-  EXPECT_EQ(changed + 2, log.entries.end()) << "no continue of its own after a repeat";
-  EXPECT_TRUE(std::all_of(log.entries.begin() + 1, changed,
+  const auto changed = std::find(log.Entries().begin(), log.Entries().end(), "apply:changed(0)");
+  ASSERT_NE(changed, log.Entries().end());
+  EXPECT_EQ(log.Entries().front(), "apply:begin");
+  EXPECT_EQ(changed + 2, log.Entries().end()) << "no continue of its own after a repeat";
+  EXPECT_TRUE(std::all_of(log.Entries().begin() + 1, changed,
                           [](const std::string& e) { return e == "apply:continue(0)"; }));
 
-  log.entries.clear();
+  log.Clear();
   apply->SetWantsKeyboardFocus(true);
   ASSERT_TRUE(apply->UI_GainKeyboardFocus());
   TypeKey(vk::kSpace);
   ASSERT_TRUE(LogEndsWith("apply:finish"));
-  EXPECT_EQ(log.entries,
+  EXPECT_EQ(log.Entries(),
             (Log{"apply:begin", "apply:changed(0)", "apply:continue(0)", "apply:finish"}));
 }
 
@@ -243,12 +218,15 @@ class X11DialogTest : public X11Test {
     params.size = {320, 120};
     params.parent = owner.get();
     dialog = velkcore::MakeIntrusive<WatchedDialog>(params);
-    ok = AddButton(dialog->GetContentContainer(), u"Save", {212, 80, 92, 26});
-    cancel = AddButton(dialog->GetContentContainer(), u"Cancel", {110, 80, 92, 26});
+    log.SetPrefixed(true);
+    ok = AddButton(dialog->GetContentContainer(), u"Save", {212, 80, 92, 26}, "ok");
+    cancel = AddButton(dialog->GetContentContainer(), u"Cancel", {110, 80, 92, 26}, "cancel");
     dialog->SetButtons(ok, cancel);
-    log.Watch(*ok, "ok");
-    log.Watch(*cancel, "cancel");
-    log.onChanged = [this](const std::string&) { Observe(); };
+    log.Watch(*ok);
+    log.Watch(*cancel);
+    log.onAdd = [this](const std::string& entry) {
+      if (entry.find(":changed") != std::string::npos) Observe();
+    };
     owner->UI_Activate();
     PumpFor(0.05);
   }
@@ -313,7 +291,7 @@ class X11DialogTest : public X11Test {
   WatchedDialogP dialog;
   UI_TextButtonP ok;
   UI_TextButtonP cancel;
-  ButtonLog log;
+  MessageLog log;
   Observed observed;
   X11OutsideClient hintsReader{x11};
   const ThreadCpuClock mainCpu;
@@ -357,7 +335,7 @@ TEST_F(X11DialogTest, ReturnEndsARealModalRunWithOkWhileTheOwnerIsBlocked) {
     Type(user, vk::kReturn);
   });
   EXPECT_EQ(response, UI_Dialog::kOk);
-  EXPECT_EQ(log.entries, kOkPressed) << "Return presses the default button";
+  EXPECT_EQ(log.Entries(), kOkPressed) << "Return presses the default button";
   EXPECT_LT(idleCpu, 0.1) << "the modal loop spins";
   EXPECT_TRUE(ownerView->MouseOf(MouseEvent::kButtonDown).empty());
 
@@ -396,7 +374,7 @@ TEST_F(X11DialogTest, TheDialogIsATransientModalWindowOfItsOwnerOnEveryRun) {
             before.protocols.end());
 
   EXPECT_EQ(RunWhile([](X11OutsideClient& user) { Type(user, vk::kEscape); }), UI_Dialog::kCancel);
-  EXPECT_EQ(log.entries,
+  EXPECT_EQ(log.Entries(),
             (Log{"cancel:begin", "cancel:changed(0)", "cancel:continue(0)", "cancel:finish"}))
       << "Escape presses the cancel button";
   EXPECT_EQ(observed.hints.transientFor, Handle(*owner));
@@ -408,9 +386,9 @@ TEST_F(X11DialogTest, TheDialogIsATransientModalWindowOfItsOwnerOnEveryRun) {
   // this run with OK.
   hintsReader.DeleteProperty(Handle(*dialog), "_NET_WM_STATE");
   ASSERT_TRUE(hintsReader.ReadHints(Handle(*dialog)).states.empty());
-  log.entries.clear();
+  log.Clear();
   EXPECT_EQ(RunWhile([](X11OutsideClient& user) { Type(user, vk::kReturn); }), UI_Dialog::kOk);
-  EXPECT_EQ(log.entries, kOkPressed);
+  EXPECT_EQ(log.Entries(), kOkPressed);
   EXPECT_EQ(observed.hints.states, before.states);
   EXPECT_EQ(observed.hints.types, before.types);
   EXPECT_TRUE(x11.IsWindowEnabled(Handle(*owner)));
@@ -427,7 +405,7 @@ TEST_F(X11DialogTest, TheBlockedOwnerFocusedByAWindowManagerHandsTheKeysBackToTh
   EXPECT_EQ(x11.GetActiveWindow(), Handle(*dialog));
   TypeKey(vk::kReturn);
   EXPECT_TRUE(PumpUntil([&] { return dialog->IsClosing(); }));
-  EXPECT_EQ(log.entries, kOkPressed);
+  EXPECT_EQ(log.Entries(), kOkPressed);
   dialog->EndModal();
   EXPECT_EQ(x11.GetActiveWindow(), Handle(*owner));
 

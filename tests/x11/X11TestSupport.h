@@ -15,6 +15,7 @@
 #include <velkcore/RefCountedObject.h>
 #include <velkui/pictel/Pictel.h>
 #include <velkui/pictel/SurfaceInterface.h>
+#include <velkui/test/InputRecorder.h>
 #include <velkui/test/PixelProbe.h>
 #include <velkui/ui/KeyboardEvent.h>
 #include <velkui/ui/MouseEvent.h>
@@ -34,31 +35,28 @@ using velkui::test::Pixel;
 using velkui::test::PixelProbe;
 
 // A view painted in one colour that keeps every mouse and keyboard event.
-class RecordingView : public UI_SubView {
+class RecordingView : public velkui::test::InputRecorder<UI_SubView> {
  public:
-  explicit RecordingView(pictel::ColorRGBA color, std::string name = "view")
-      : color(color), name_(std::move(name)) {
-    UI_SetNodeID(name_);
+  explicit RecordingView(pictel::ColorRGBA color, std::string name = "view") : color(color) {
+    UI_SetNodeID(name);
   }
 
   pictel::ColorRGBA color;
   bool wantsFocus = false;
-  std::vector<MouseEvent> mouse;
-  std::vector<KeyboardEvent> keys;
-  // "down", "up", "move", "key", "char"... in the order they came.
+  // "down", "up", "keydown", "keyup", "char" in the order they came.
   std::vector<std::string> order;
   std::function<void(const MouseEvent&)> onMouse;
   int draws = 0;
 
-  bool UI_DoMouseEvent(UI_Node*, const MouseEvent& event) override {
-    mouse.push_back(event);
+  bool UI_DoMouseEvent(UI_Node* target, const MouseEvent& event) override {
+    InputRecorder::UI_DoMouseEvent(target, event);
     if (event.GetAction() == MouseEvent::kButtonDown) order.push_back("down");
     if (event.GetAction() == MouseEvent::kButtonUp) order.push_back("up");
     if (onMouse) onMouse(event);
     return event.GetAction() != MouseEvent::kMove;
   }
-  bool UI_DoKeyboardEvent(UI_Node*, const KeyboardEvent& event) override {
-    keys.push_back(event);
+  bool UI_DoKeyboardEvent(UI_Node* target, const KeyboardEvent& event) override {
+    InputRecorder::UI_DoKeyboardEvent(target, event);
     order.push_back(event.IsActionKeyDown() ? "keydown" : event.IsActionKeyUp() ? "keyup" : "char");
     return true;
   }
@@ -69,20 +67,6 @@ class RecordingView : public UI_SubView {
     UI_SubView::UI_Draw(context);
   }
 
-  std::vector<MouseEvent> MouseOf(MouseEvent::Action action) const {
-    std::vector<MouseEvent> found;
-    for (const MouseEvent& e : mouse) {
-      if (e.GetAction() == action) found.push_back(e);
-    }
-    return found;
-  }
-  std::u16string Typed() const {
-    std::u16string text;
-    for (const KeyboardEvent& e : keys) {
-      if (e.IsActionKeyChar() && e.GetNumCharacters() > 0) text += e.GetCharacter(0);
-    }
-    return text;
-  }
   std::vector<std::int16_t> KeyDownCodes() const {
     std::vector<std::int16_t> codes;
     for (const KeyboardEvent& e : keys) {
@@ -90,9 +74,6 @@ class RecordingView : public UI_SubView {
     }
     return codes;
   }
-
- private:
-  std::string name_;
 };
 using RecordingViewP = boost::intrusive_ptr<RecordingView>;
 

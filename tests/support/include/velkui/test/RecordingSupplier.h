@@ -17,9 +17,9 @@ namespace velkui::test {
 
 // One call a recording surface received, with the state it was made in.
 struct RecordedCall {
-  int surface = 0;          // id of the surface (RecordingSurface::GetId)
-  std::string name;         // "PaintRect", "FillPath", "DrawString", ...
-  std::string arguments;    // the arguments, spelled out
+  int surface = 0;        // id of the surface (RecordingSurface::GetId)
+  std::string name;       // "PaintRect", "FillPath", "DrawString", ...
+  std::string arguments;  // the arguments, spelled out
   velkcore::MatrixT<float> transform;
   velkcore::RectT<std::int32_t> clip;  // device pixels
   pictel::AntiAliasPolicy antiAlias = pictel::AntiAliasPolicy::kOn;
@@ -148,8 +148,7 @@ class RecordingSupplier : public pictel::SupplierInterface {
   boost::intrusive_ptr<pictel::SurfaceInterface> NewImageSurface(
       pictel::ImageInterface* image, bool clear,
       const velkcore::RectT<std::int32_t>* bounds) const override;
-  boost::intrusive_ptr<pictel::SurfaceInterface> NewSurface(std::int32_t width,
-                                                            std::int32_t height,
+  boost::intrusive_ptr<pictel::SurfaceInterface> NewSurface(std::int32_t width, std::int32_t height,
                                                             bool transparent) const override;
   boost::intrusive_ptr<pictel::SurfaceInterface> NewBufferSurface(
       std::int32_t width, std::int32_t height, std::int32_t rowBytes, pictel::PixelLayout layout,
@@ -172,8 +171,8 @@ class RecordingSupplier : public pictel::SupplierInterface {
                                                       const velkcore::UTF16String& style,
                                                       float size) const override;
   // Reads the size from a PNG header (error 28 for anything else).
-  boost::intrusive_ptr<pictel::ImageInterface> NewFileImage(const void* bytes, std::size_t size,
-                                                            pictel::ImageFileType type) const override;
+  boost::intrusive_ptr<pictel::ImageInterface> NewFileImage(
+      const void* bytes, std::size_t size, pictel::ImageFileType type) const override;
   boost::intrusive_ptr<pictel::ImageInterface> NewBufferImage(
       std::int32_t width, std::int32_t height, std::int32_t rowBytes, pictel::PixelLayout layout,
       void* pixels, pictel::BufferDeleter deleter) const override;
