@@ -21,6 +21,7 @@
 #include <velkui/ui/OS_Window.h>
 
 #include "DialogGallery.h"
+#include "GalleryNodes.h"
 #include "GalleryPage.h"
 
 namespace gallery {
@@ -37,15 +38,6 @@ constexpr std::int32_t kScreenWidth = 720;
 constexpr std::int32_t kScreenHeight = 470;
 constexpr float kMargin = 24;
 constexpr float kCaptionHeight = 34;
-
-template <typename Node>
-boost::intrusive_ptr<Node> Place(ui::UI_Node& parent, const RectT<float>& frame,
-                                 boost::intrusive_ptr<Node> node) {
-  node->UI_SetLocalRectF(frame);
-  node->UI_Show(true);
-  parent.ChildPushBack(node);
-  return node;
-}
 
 // The window the dialog belongs to: a session with a transport row and its tracks.
 ui::OS_WindowP MakeSessionWindow() {

@@ -29,6 +29,7 @@
 
 #include "ControlsGallery.h"
 #include "DialogGallery.h"
+#include "GalleryNodes.h"
 
 namespace gallery {
 
@@ -49,15 +50,6 @@ constexpr float kCardPadding = 18;
 // The pictures are rendered on this colour; the page area matches it.
 constexpr pictel::ColorRGBA kPageColor{0.86f, 0.87f, 0.89f, 1};
 constexpr pictel::ColorRGBA kBarColor{0.16f, 0.18f, 0.21f, 1};
-
-template <typename Node>
-boost::intrusive_ptr<Node> Place(ui::UI_Node& parent, const RectT<float>& frame,
-                                 boost::intrusive_ptr<Node> node) {
-  node->UI_SetLocalRectF(frame);
-  node->UI_Show(true);
-  parent.ChildPushBack(node);
-  return node;
-}
 
 // Wrapped text that starts at the top of its box.
 boost::intrusive_ptr<controls::UI_StaticText> Paragraph(const std::u16string& text) {

@@ -11,16 +11,13 @@
 
 #include <velkcore/Strings.h>
 #include <velkui/pictel/OSSupplier.h>
-#include <velkui/pictel/PathShapes.h>
-#include <velkui/pictel/Pictel.h>
-#include <velkui/pictel/PictelHandles.h>
 #include <velkui/pictel/SupplierInterface.h>
 #include <velkui/pictel/SurfaceInterface.h>
 #include <velkui/ui/HeadlessPlatform.h>
 #include <velkui/ui/OS_Window.h>
-#include <velkui/ui/Theme.h>
 
 #include "GalleryPage.h"
+#include "GalleryPainter.h"
 #include "LayoutPanel.h"
 
 namespace gallery {
@@ -30,7 +27,6 @@ using velkcore::PointT;
 using velkcore::RectT;
 using velkui::pictel::ColorRGBA;
 using velkui::pictel::TextAlignment;
-using velkui::pictel::TextTruncation;
 namespace ui = velkui::ui;
 namespace pictel = velkui::pictel;
 
@@ -46,78 +42,6 @@ constexpr PointT<float> kNarrowAt{856, 132};
 constexpr ColorRGBA kInk{0.13f, 0.15f, 0.19f, 1};
 constexpr ColorRGBA kMutedInk{0.36f, 0.39f, 0.45f, 1};
 constexpr ColorRGBA kAccent{0.16f, 0.45f, 0.86f, 1};
-
-class Painter {
- public:
-  Painter(const pictel::SupplierInterface& supplier, pictel::SurfaceInterface& surface)
-      : supplier_(supplier), surface_(surface) {}
-
-  void FillRound(const RectT<float>& r, float radius, const ColorRGBA& color) {
-    pictel::PathP path;
-    velkui::GetRoundedRectPath(&supplier_, r, radius, &path);
-    surface_.FillPath(*pictel::BrushP(supplier_, color), *path, pictel::FillType::kWinding);
-  }
-  void Gradient(const RectT<float>& r, const ColorRGBA& top, const ColorRGBA& bottom) {
-    const auto shader =
-        supplier_.NewLinearShader({r.left, r.top}, {r.left, r.top + r.height}, top, bottom);
-    pictel::PathP path(supplier_);
-    path->AddRect(r);
-    surface_.ShadePath(*shader, *path, pictel::FillType::kWinding);
-  }
-  void Polygon(const std::vector<PointT<float>>& points, const ColorRGBA& color) {
-    pictel::PathP path(supplier_);
-    path->MoveTo(points.front());
-    for (std::size_t i = 1; i < points.size(); ++i) path->LineTo(points[i]);
-    path->Close();
-    surface_.FillPath(*pictel::BrushP(supplier_, color), *path, pictel::FillType::kWinding);
-  }
-  void Line(PointT<float> a, PointT<float> b, const ColorRGBA& color, float width) {
-    pictel::PathP path(supplier_);
-    path->MoveTo(a);
-    path->LineTo(b);
-    surface_.StrokePath(*pictel::PenP(supplier_, color, width), *path);
-  }
-  void Text(const std::u16string& text, PointT<float> at, const ColorRGBA& color, float size,
-            bool bold = false, TextAlignment alignment = TextAlignment::kStart) {
-    surface_.DrawString(*pictel::BrushP(supplier_, color), *Font(size, bold), text.c_str(), at,
-                        alignment, TextTruncation::kEndEllipsis, 2000);
-  }
-  // Text wrapped to `width` from `topLeft`; returns its height.
-  float Paragraph(const std::u16string& text, PointT<float> topLeft, float width,
-                  const ColorRGBA& color, float size) {
-    const pictel::FontP font = Font(size, false);
-    const float height = surface_.MeasureMultiLineStringHeight(
-        *font, text.c_str(), width, static_cast<std::int32_t>(text.size()));
-    surface_.DrawMultiLineString(*pictel::BrushP(supplier_, color), *font, text.c_str(),
-                                 {topLeft.x, topLeft.y, width, height + 4}, TextAlignment::kStart);
-    return height;
-  }
-  // A soft shadow under a window: a few widening, fading layers.
-  void Shadow(const RectT<float>& r) {
-    for (int i = 0; i < 6; ++i) {
-      const auto spread = static_cast<float>(i) * 2.0f;
-      FillRound({r.left - spread, r.top - spread + 6, r.width + 2 * spread, r.height + 2 * spread},
-                4 + spread, {0.02f, 0.04f, 0.10f, 0.07f});
-    }
-  }
-  // `image`'s pixels inside `source` (image coordinates), drawn with their top-left at `at`.
-  void Crop(const pictel::ImageInterface& image, const RectT<float>& source, PointT<float> at) {
-    surface_.PushStateStack();
-    pictel::PathP clip(supplier_);
-    clip->AddRect(RectT<float>{at.x, at.y, source.width, source.height});
-    surface_.Clip(*clip, pictel::FillType::kWinding);
-    surface_.DrawImage(image, {at.x - source.left, at.y - source.top}, 1.0f);
-    surface_.PopStateStack();
-  }
-
- private:
-  pictel::FontP Font(float size, bool bold) const {
-    return pictel::FontP(supplier_, ui::Theme::Get().GetFontName(0), bold ? u"Bold" : u"", size);
-  }
-
-  const pictel::SupplierInterface& supplier_;
-  pictel::SurfaceInterface& surface_;
-};
 
 std::u16string Text(const char* format, int a, int b = 0) {
   char text[160];

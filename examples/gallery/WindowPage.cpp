@@ -9,7 +9,6 @@
 
 #include <velkcore/Strings.h>
 #include <velkui/pictel/OSSupplier.h>
-#include <velkui/pictel/PathShapes.h>
 #include <velkui/pictel/Pictel.h>
 #include <velkui/pictel/PictelHandles.h>
 #include <velkui/pictel/SupplierInterface.h>
@@ -21,7 +20,9 @@
 #include <velkui/ui/UI_SubView.h>
 #include <velkui/ui/UI_ToolTipManager.h>
 
+#include "GalleryNodes.h"
 #include "GalleryPage.h"
+#include "GalleryPainter.h"
 
 namespace gallery {
 namespace {
@@ -30,7 +31,6 @@ using velkcore::PointT;
 using velkcore::RectT;
 using velkui::pictel::ColorRGBA;
 using velkui::pictel::TextAlignment;
-using velkui::pictel::TextTruncation;
 namespace ui = velkui::ui;
 namespace pictel = velkui::pictel;
 
@@ -43,62 +43,6 @@ constexpr float kFramesPerSecond = 30.0f;
 ColorRGBA Color(ui::ThemeColorIndex index) {
   return ui::Theme::Get().GetColor(index);
 }
-
-// Drawing conveniences for one paint of one node.
-class Painter {
- public:
-  explicit Painter(pictel::Pictel* context)
-      : supplier_(*context->GetSupplier()), surface_(*context->GetSurface()) {}
-
-  void Fill(const RectT<float>& r, const ColorRGBA& color) { surface_.PaintRect(color, r); }
-  void FillRound(const RectT<float>& r, float radius, const ColorRGBA& color) {
-    pictel::PathP path;
-    velkui::GetRoundedRectPath(&supplier_, r, radius, &path);
-    surface_.FillPath(*pictel::BrushP(supplier_, color), *path, pictel::FillType::kWinding);
-  }
-  void StrokeRound(const RectT<float>& r, float radius, const ColorRGBA& color, float width = 1) {
-    pictel::PathP path;
-    velkui::GetRoundedRectPath(&supplier_, r, radius, &path);
-    surface_.StrokePath(*pictel::PenP(supplier_, color, width), *path);
-  }
-  void Gradient(const RectT<float>& r, const ColorRGBA& top, const ColorRGBA& bottom,
-                float radius = 0) {
-    const auto shader =
-        supplier_.NewLinearShader({r.left, r.top}, {r.left, r.top + r.height}, top, bottom);
-    pictel::PathP path;
-    if (radius > 0) {
-      velkui::GetRoundedRectPath(&supplier_, r, radius, &path);
-    } else {
-      path = pictel::PathP(supplier_);
-      path->AddRect(r);
-    }
-    surface_.ShadePath(*shader, *path, pictel::FillType::kWinding);
-  }
-  void Line(PointT<float> a, PointT<float> b, const ColorRGBA& color, float width = 1) {
-    pictel::PathP path(supplier_);
-    path->MoveTo(a);
-    path->LineTo(b);
-    surface_.StrokePath(*pictel::PenP(supplier_, color, width), *path);
-  }
-  void Polygon(const std::vector<PointT<float>>& points, const ColorRGBA& color) {
-    pictel::PathP path(supplier_);
-    path->MoveTo(points.front());
-    for (std::size_t i = 1; i < points.size(); ++i) path->LineTo(points[i]);
-    path->Close();
-    surface_.FillPath(*pictel::BrushP(supplier_, color), *path, pictel::FillType::kWinding);
-  }
-  void Text(const std::u16string& text, PointT<float> at, const ColorRGBA& color, float size,
-            bool bold = false, TextAlignment alignment = TextAlignment::kStart) {
-    const pictel::FontP font(supplier_, FontFamily(), bold ? u"Bold" : u"", size);
-    surface_.DrawString(*pictel::BrushP(supplier_, color), *font, text.c_str(), at, alignment,
-                        TextTruncation::kEndEllipsis, 2000);
-  }
-  static std::u16string FontFamily() { return ui::Theme::Get().GetFontName(0); }
-
- private:
-  const pictel::SupplierInterface& supplier_;
-  pictel::SurfaceInterface& surface_;
-};
 
 // What the animation has done so far (shared by the nodes that show it).
 struct Transport {
@@ -404,11 +348,7 @@ class StatusBar : public ui::UI_SubView {
 
 template <typename Node, typename... Args>
 boost::intrusive_ptr<Node> Add(ui::UI_Node& parent, const RectT<float>& frame, Args&&... args) {
-  auto node = velkcore::MakeIntrusive<Node>(std::forward<Args>(args)...);
-  node->UI_SetLocalRectF(frame);
-  node->UI_Show(true);
-  parent.ChildPushBack(node);
-  return node;
+  return Place(parent, frame, velkcore::MakeIntrusive<Node>(std::forward<Args>(args)...));
 }
 
 void DrawPointer(Painter& p, PointT<float> at) {

@@ -4,6 +4,10 @@
 
 namespace velkui::ui::headless {
 
+using platform::ControlCharacter;
+using platform::IsLockKey;
+using platform::SyncGenericModifiers;
+
 namespace {
 
 constexpr std::int16_t kF10 = vk::kF10;
@@ -85,39 +89,7 @@ char16_t KeypadCharacter(std::int16_t key) {
   }
 }
 
-char16_t ControlCharacter(std::int16_t key) {
-  if (IsLetter(key)) return static_cast<char16_t>(key - 'A' + 1);
-  switch (key) {
-    case 219:
-      return 27;
-    case 220:
-      return 28;
-    case 221:
-      return 29;
-    case vk::kReturn:
-      return 10;
-    case vk::kBackspace:
-      return 127;
-    case vk::kSpace:
-      return u' ';
-    case vk::kEscape:
-      return 27;
-    default:
-      return 0;
-  }
-}
-
 }  // namespace
-
-bool IsLockKey(std::int16_t virtualKey) {
-  return virtualKey == vk::kCapsLock || virtualKey == vk::kNumLock || virtualKey == vk::kScrollLock;
-}
-
-void SyncGenericModifiers(KeyTable& keys) {
-  keys[vk::kShift].down = keys[vk::kLeftShift].down || keys[vk::kRightShift].down;
-  keys[vk::kControl].down = keys[vk::kLeftControl].down || keys[vk::kRightControl].down;
-  keys[vk::kAlt].down = keys[vk::kLeftAlt].down || keys[vk::kRightAlt].down;
-}
 
 void SyncSides(KeyTable& keys, std::int16_t virtualKey, bool down) {
   switch (virtualKey) {

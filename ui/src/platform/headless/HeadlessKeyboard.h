@@ -1,16 +1,17 @@
 #pragma once
 
-#include <array>
 #include <cstdint>
 
 #include <velkui/ui/OS_Event.h>
 #include <velkui/ui/PlatformTypes.h>
 
+#include "../common/KeyTable.h"
+
 // The headless backend's keyboard: a US layout, modifier sides, lock keys and
 // the keypad's double role, as a desktop keyboard driver reports them.
 namespace velkui::ui::headless {
 
-using KeyTable = std::array<KeyState, 256>;
+using platform::KeyTable;
 
 // One key message as the keyboard produces it.
 struct KeyStroke {
@@ -19,9 +20,6 @@ struct KeyStroke {
   KeyData data;
 };
 
-bool IsLockKey(std::int16_t virtualKey);
-// The generic Shift, Control and Alt follow their two sides.
-void SyncGenericModifiers(KeyTable& keys);
 // Setting a key directly: a generic modifier sets its left side, a side its generic key.
 void SyncSides(KeyTable& keys, std::int16_t virtualKey, bool down);
 // Presses or releases a key on `physical` and answers the message it makes.

@@ -17,6 +17,8 @@
 #include <velkui/pictel/SurfaceInterface.h>
 #include <velkui/ui/OS_MessagePump.h>
 
+#include "../common/PixelBuffer.h"
+#include "../common/WindowTable.h"
 #include "HeadlessKeyboard.h"
 
 namespace velkui::ui {
@@ -26,6 +28,9 @@ using velkcore::RectT;
 
 namespace {
 
+using platform::AddPendingArea;
+using platform::Insets;
+
 constexpr std::uint32_t kMinimumTimerInterval = 10;
 constexpr std::int32_t kTitleBarHeight = 24;
 constexpr std::int32_t kBorder = 1;
@@ -33,46 +38,19 @@ constexpr std::int32_t kSizingBorder = 4;
 constexpr std::string_view kEndlessMessagesKey =
     "$$$/velkui/ui/Error/EndlessMessages=The message queue did not run dry after ^0 messages.";
 constexpr std::int32_t kEndlessMessagesNumber = 22;
-// More separate pending rectangles than this are merged into their bounds.
-constexpr std::size_t kMaxPendingRects = 16;
 
 struct CairoSurfaceDeleter {
   void operator()(cairo_surface_t* surface) const { cairo_surface_destroy(surface); }
 };
 using SurfacePtr = std::unique_ptr<cairo_surface_t, CairoSurfaceDeleter>;
 
-struct Insets {
-  std::int32_t left = 0;
-  std::int32_t top = 0;
-  std::int32_t right = 0;
-  std::int32_t bottom = 0;
-};
-
 struct Timer {
   std::uint32_t interval = kMinimumTimerInterval;
   double due = 0;
 };
 
-struct WindowRecord {
-  PlatformWindow handle = kNoPlatformWindow;
-  // The parent of a child window, the owner of any other.
-  PlatformWindow parent = kNoPlatformWindow;
-  bool child = false;
-  velkcore::UTF16String title;
-  // Screen coordinates for top-level windows; relative to the parent's client
-  // origin for child windows.
-  RectT<std::int32_t> client;
-  std::uint32_t style = 0;
-  std::uint32_t exStyle = 0;
-  bool visible = false;
-  bool enabled = true;
-  bool minimized = false;
-  float opacity = 1.0f;
-  std::optional<pictel::ColorRGBA> colorKey;
+struct WindowRecord : platform::WindowRecordBase {
   SurfacePtr surface;
-  std::vector<RectT<std::int32_t>> pending;
-  bool trackLeave = false;
-  std::int32_t paintCount = 0;
   std::map<std::uint32_t, Timer> timers;
 };
 
@@ -88,36 +66,6 @@ Insets InsetsFor(std::uint32_t style) {
   return insets;
 }
 
-bool Contains(const RectT<std::int32_t>& outer, const RectT<std::int32_t>& inner) {
-  return inner.left >= outer.left && inner.top >= outer.top && inner.Right() <= outer.Right() &&
-         inner.Bottom() <= outer.Bottom();
-}
-
-std::int32_t ButtonBitFor(std::uint32_t message) {
-  switch (message) {
-    case kMsgLeftButtonDown:
-    case kMsgLeftButtonUp:
-    case kMsgLeftButtonDoubleClick:
-      return 1;
-    case kMsgMiddleButtonDown:
-    case kMsgMiddleButtonUp:
-    case kMsgMiddleButtonDoubleClick:
-      return 2;
-    case kMsgRightButtonDown:
-    case kMsgRightButtonUp:
-    case kMsgRightButtonDoubleClick:
-      return 4;
-    default:
-      return 0;
-  }
-}
-
-std::int16_t ButtonVirtualKey(std::int32_t button) {
-  if (button == 1) return vk::kLeftButton;
-  if (button == 2) return vk::kMiddleButton;
-  return vk::kRightButton;
-}
-
 std::uint32_t ButtonMessage(std::int32_t button, int kind) {
   // kind: 0 down, 1 up, 2 double click.
   const std::uint32_t base = button == 1   ? kMsgLeftButtonDown
@@ -129,37 +77,25 @@ std::uint32_t ButtonMessage(std::int32_t button, int kind) {
 // Copies a Cairo image into a new image of the platform supplier.
 boost::intrusive_ptr<pictel::ImageInterface> CopyToImage(cairo_surface_t* source,
                                                          std::int32_t width, std::int32_t height) {
-  const std::int32_t w = std::max(width, 1);
-  const std::int32_t h = std::max(height, 1);
-  const std::int32_t stride = w * 4;
-  auto* pixels = static_cast<unsigned char*>(std::calloc(static_cast<std::size_t>(stride) * h, 1));
-  if (pixels == nullptr) throw std::bad_alloc();
+  platform::PixelBuffer pixels(width, height);
   if (source != nullptr) {
     cairo_surface_flush(source);
     const unsigned char* data = cairo_image_surface_get_data(source);
     const std::int32_t sourceStride = cairo_image_surface_get_stride(source);
-    const std::int32_t rows = std::min(h, cairo_image_surface_get_height(source));
-    const std::int32_t bytes = std::min(w, cairo_image_surface_get_width(source)) * 4;
+    const std::int32_t rows = std::min(pixels.Height(), cairo_image_surface_get_height(source));
+    const std::int32_t bytes = std::min(pixels.Width(), cairo_image_surface_get_width(source)) * 4;
     for (std::int32_t y = 0; y < rows; ++y) {
-      std::memcpy(pixels + static_cast<std::ptrdiff_t>(y) * stride,
-                  data + static_cast<std::ptrdiff_t>(y) * sourceStride,
+      std::memcpy(pixels.Row(y), data + static_cast<std::ptrdiff_t>(y) * sourceStride,
                   static_cast<std::size_t>(bytes));
     }
   }
-  const boost::intrusive_ptr<pictel::SupplierInterface> supplier = pictel::NewOSSupplier();
-  try {
-    return supplier->NewBufferImage(w, h, stride, pictel::PixelLayout::kBGRAPremultiplied, pixels,
-                                    [](void* p) { std::free(p); });
-  } catch (...) {
-    std::free(pixels);
-    throw;
-  }
+  return pixels.ToImage();
 }
 
 }  // namespace
 
 struct HeadlessPlatform::Impl {
-  std::map<PlatformWindow, WindowRecord> windows;
+  platform::WindowTable<WindowRecord> windows;
   // Top-level windows, bottom to top.
   std::vector<PlatformWindow> stacking;
   PlatformWindow nextHandle = 1;
@@ -193,89 +129,28 @@ struct HeadlessPlatform::Impl {
   std::int32_t quitCode = 0;
   std::int64_t messageLimit = 100000;
 
-  WindowRecord* Find(PlatformWindow handle) {
-    const auto found = windows.find(handle);
-    return found != windows.end() ? &found->second : nullptr;
-  }
-  const WindowRecord* Find(PlatformWindow handle) const {
-    const auto found = windows.find(handle);
-    return found != windows.end() ? &found->second : nullptr;
-  }
-
   void Post(PlatformWindow window, std::uint32_t message, std::uint64_t w = 0, std::int64_t l = 0) {
     queue.emplace_back(window, message, w, l, now);
   }
 
-  PointT<std::int32_t> ClientOrigin(const WindowRecord& record) const {
-    PointT<std::int32_t> origin{record.client.left, record.client.top};
-    if (record.child) {
-      if (const WindowRecord* parent = Find(record.parent)) {
-        const PointT<std::int32_t> base = ClientOrigin(*parent);
-        origin.x += base.x;
-        origin.y += base.y;
-      }
-    }
-    return origin;
-  }
-  RectT<std::int32_t> ScreenClient(const WindowRecord& record) const {
-    const PointT<std::int32_t> origin = ClientOrigin(record);
-    return {origin.x, origin.y, record.client.width, record.client.height};
-  }
   RectT<std::int32_t> ScreenFrame(const WindowRecord& record) const {
-    const RectT<std::int32_t> client = ScreenClient(record);
-    const Insets insets = InsetsFor(record.style);
-    return {client.left - insets.left, client.top - insets.top,
-            client.width + insets.left + insets.right, client.height + insets.top + insets.bottom};
-  }
-
-  // Shown with every ancestor, not minimized.
-  bool IsShownOnScreen(const WindowRecord& record) const {
-    if (!record.visible || record.minimized) return false;
-    if (!record.child) return true;
-    const WindowRecord* parent = Find(record.parent);
-    return parent != nullptr && IsShownOnScreen(*parent);
-  }
-  bool IsEnabledForInput(PlatformWindow handle) const {
-    for (const WindowRecord* record = Find(handle); record != nullptr;
-         record = record->child ? Find(record->parent) : nullptr) {
-      if (!record->enabled) return false;
-    }
-    return handle != kNoPlatformWindow;
-  }
-  PlatformWindow TopLevelOf(PlatformWindow handle) const {
-    const WindowRecord* record = Find(handle);
-    while (record != nullptr && record->child) record = Find(record->parent);
-    return record != nullptr ? record->handle : kNoPlatformWindow;
-  }
-  bool IsWithin(PlatformWindow handle, PlatformWindow ancestor) const {
-    for (const WindowRecord* record = Find(handle); record != nullptr;
-         record = record->child ? Find(record->parent) : nullptr) {
-      if (record->handle == ancestor) return true;
-    }
-    return false;
-  }
-  std::vector<PlatformWindow> ChildrenOf(PlatformWindow handle) const {
-    std::vector<PlatformWindow> children;
-    for (const auto& [h, record] : windows) {
-      if (record.child && record.parent == handle) children.push_back(h);
-    }
-    return children;
+    return platform::FrameAround(windows.ScreenClient(record), InsetsFor(record.style));
   }
 
   PlatformWindow DeepestAt(PlatformWindow handle, const PointT<std::int32_t>& p) const {
-    const std::vector<PlatformWindow> children = ChildrenOf(handle);
+    const std::vector<PlatformWindow> children = windows.ChildrenOf(handle);
     // Later children lie on top.
     for (auto it = children.rbegin(); it != children.rend(); ++it) {
-      const WindowRecord& child = *Find(*it);
-      if (child.visible && ScreenClient(child).Contains(p)) return DeepestAt(*it, p);
+      const WindowRecord& child = *windows.Find(*it);
+      if (child.visible && windows.ScreenClient(child).Contains(p)) return DeepestAt(*it, p);
     }
     return handle;
   }
   PlatformWindow WindowAt(const PointT<std::int32_t>& p) const {
     for (auto it = stacking.rbegin(); it != stacking.rend(); ++it) {
-      const WindowRecord& record = *Find(*it);
-      if (!IsShownOnScreen(record)) continue;
-      if (ScreenClient(record).Contains(p)) return DeepestAt(*it, p);
+      const WindowRecord& record = *windows.Find(*it);
+      if (!windows.IsShownOnScreen(record)) continue;
+      if (windows.ScreenClient(record).Contains(p)) return DeepestAt(*it, p);
       // The decoration hides whatever lies below it.
       if (ScreenFrame(record).Contains(p)) return kNoPlatformWindow;
     }
@@ -283,16 +158,16 @@ struct HeadlessPlatform::Impl {
   }
 
   void PostLeaveIfTracked(PlatformWindow handle) {
-    WindowRecord* record = Find(handle);
+    WindowRecord* record = windows.Find(handle);
     if (record == nullptr || !record->trackLeave) return;
     record->trackLeave = false;
     Post(handle, kMsgPointerLeft);
   }
 
   void PostPointer(PlatformWindow target, std::uint32_t message) {
-    const WindowRecord* record = Find(target);
+    const WindowRecord* record = windows.Find(target);
     if (record == nullptr) return;
-    const PointT<std::int32_t> origin = ClientOrigin(*record);
+    const PointT<std::int32_t> origin = windows.ClientOrigin(*record);
     Post(target, message, static_cast<std::uint64_t>(buttons),
          MakePointParam({pointer.x - origin.x, pointer.y - origin.y}));
   }
@@ -300,19 +175,19 @@ struct HeadlessPlatform::Impl {
   PlatformWindow PointerTarget() const {
     if (capture != kNoPlatformWindow) return capture;
     const PlatformWindow under = WindowAt(pointer);
-    return IsEnabledForInput(under) ? under : kNoPlatformWindow;
+    return windows.IsEnabledForInput(under) ? under : kNoPlatformWindow;
   }
 
   PlatformWindow KeyboardTarget() const {
     const PlatformWindow target = focus != kNoPlatformWindow ? focus : active;
-    return IsEnabledForInput(target) ? target : kNoPlatformWindow;
+    return windows.IsEnabledForInput(target) ? target : kNoPlatformWindow;
   }
 
   void SetFocus(PlatformWindow handle) {
     if (handle == focus) return;
     const PlatformWindow old = focus;
     focus = handle;
-    if (Find(old) != nullptr) Post(old, kMsgKillFocus, handle);
+    if (windows.Find(old) != nullptr) Post(old, kMsgKillFocus, handle);
     if (handle != kNoPlatformWindow) Post(handle, kMsgSetFocus, old);
   }
 
@@ -321,19 +196,19 @@ struct HeadlessPlatform::Impl {
     if (found == stacking.end()) return;
     stacking.erase(found);
     // Topmost windows stay above the others.
-    const bool topmost = (Find(top)->exStyle & kExStyleTopmost) != 0;
+    const bool topmost = (windows.Find(top)->exStyle & kExStyleTopmost) != 0;
     auto position = stacking.end();
     if (!topmost) {
       position = std::find_if(stacking.begin(), stacking.end(), [this](PlatformWindow h) {
-        return (Find(h)->exStyle & kExStyleTopmost) != 0;
+        return (windows.Find(h)->exStyle & kExStyleTopmost) != 0;
       });
     }
     stacking.insert(position, top);
   }
 
   void Activate(PlatformWindow handle, bool byClick) {
-    const PlatformWindow top = TopLevelOf(handle);
-    const WindowRecord* record = Find(top);
+    const PlatformWindow top = windows.TopLevelOf(handle);
+    const WindowRecord* record = windows.Find(top);
     if (record == nullptr || !record->visible || (record->exStyle & kExStyleNoActivate) != 0) {
       return;
     }
@@ -341,14 +216,14 @@ struct HeadlessPlatform::Impl {
     if (active != top) {
       const PlatformWindow old = active;
       active = top;
-      if (Find(old) != nullptr) Post(old, kMsgActivate, 0);
+      if (windows.Find(old) != nullptr) Post(old, kMsgActivate, 0);
       if (!applicationActive) {
         applicationActive = true;
         Post(top, kMsgActivateApp, 1);
       }
       Post(top, kMsgActivate, byClick ? 2 : 1);
     }
-    if (!IsWithin(focus, top)) SetFocus(top);
+    if (!windows.IsWithin(focus, top)) SetFocus(top);
   }
 
   // The active window went away or was hidden: the next shown top-level
@@ -357,62 +232,25 @@ struct HeadlessPlatform::Impl {
     if (active != leaving) return;
     active = kNoPlatformWindow;
     for (auto it = stacking.rbegin(); it != stacking.rend(); ++it) {
-      const WindowRecord& record = *Find(*it);
+      const WindowRecord& record = *windows.Find(*it);
       if (*it != leaving && record.visible && !record.minimized &&
           (record.exStyle & kExStyleNoActivate) == 0) {
         Activate(*it, false);
         return;
       }
     }
-    if (IsWithin(focus, leaving)) SetFocus(kNoPlatformWindow);
+    if (windows.IsWithin(focus, leaving)) SetFocus(kNoPlatformWindow);
     if (applicationActive) {
       applicationActive = false;
-      if (Find(leaving) != nullptr) Post(leaving, kMsgActivateApp, 0);
+      if (windows.Find(leaving) != nullptr) Post(leaving, kMsgActivateApp, 0);
     }
-  }
-
-  void Invalidate(WindowRecord& record, const RectT<std::int32_t>* rect) {
-    const RectT<std::int32_t> whole{0, 0, record.client.width, record.client.height};
-    const RectT<std::int32_t> area = rect != nullptr ? velkcore::Intersection(whole, *rect) : whole;
-    if (area.IsEmpty()) return;
-    for (const RectT<std::int32_t>& existing : record.pending) {
-      if (Contains(existing, area)) return;
-    }
-    std::erase_if(record.pending, [&area](const RectT<std::int32_t>& existing) {
-      return Contains(area, existing);
-    });
-    record.pending.push_back(area);
-    if (record.pending.size() > kMaxPendingRects) {
-      RectT<std::int32_t> bounds;
-      for (const RectT<std::int32_t>& r : record.pending) bounds = velkcore::Union(bounds, r);
-      record.pending = {bounds};
-    }
-  }
-
-  bool IsPaintable(const WindowRecord& record) const {
-    return !record.pending.empty() && IsShownOnScreen(record) && record.client.width > 0 &&
-           record.client.height > 0;
   }
 
   void UpdateKeyState(const OS_Event& event) {
-    const std::uint32_t message = event.GetMsg();
-    if (const std::int32_t button = ButtonBitFor(message)) {
-      const bool down = message != kMsgLeftButtonUp && message != kMsgMiddleButtonUp &&
-                        message != kMsgRightButtonUp;
-      keys[static_cast<std::size_t>(ButtonVirtualKey(button))].down = down;
-      return;
-    }
-    if (message < kMsgKeyDown || message > kMsgSysKeyUp) return;
-    const bool down = message == kMsgKeyDown || message == kMsgSysKeyDown;
-    const KeyData data = GetKeyParam(event.GetLParam());
-    const auto key = static_cast<std::size_t>(event.GetWParam() & 0xFFu);
-    const auto scan = static_cast<std::size_t>(data.scanCode & 0xFFu);
-    if (down && !data.previouslyDown && headless::IsLockKey(static_cast<std::int16_t>(key))) {
-      keys[key].toggled = !keys[key].toggled;
-    }
-    keys[key].down = down;
-    keys[scan].down = down;
-    headless::SyncGenericModifiers(keys);
+    if (platform::ApplyButtonMessage(keys, event.GetMsg())) return;
+    // The scan codes are the keys' sides.
+    platform::ApplyKeyMessage(keys, event,
+                              static_cast<std::int16_t>(GetKeyParam(event.GetLParam()).scanCode));
   }
 
   std::optional<double> NextDue() const {
@@ -461,25 +299,15 @@ struct HeadlessPlatform::Impl {
     }
   }
 
-  void Resize(WindowRecord& record, const RectT<std::int32_t>& relative) {
-    const bool resized =
-        relative.width != record.client.width || relative.height != record.client.height;
-    record.client = relative;
-    if (resized) {
-      record.pending.clear();
-      Invalidate(record, nullptr);
-    }
-  }
-
   void DestroyRecursive(PlatformWindow handle) {
-    for (const PlatformWindow child : ChildrenOf(handle)) DestroyRecursive(child);
+    for (const PlatformWindow child : windows.ChildrenOf(handle)) DestroyRecursive(child);
     if (capture == handle) capture = kNoPlatformWindow;
     if (hover == handle) hover = kNoPlatformWindow;
     if (focus == handle) focus = kNoPlatformWindow;
     if (lastPress && lastPress->window == handle) lastPress.reset();
     std::erase_if(queue, [handle](const OS_Event& e) { return e.GetWindow() == handle; });
     std::erase(stacking, handle);
-    windows.erase(handle);
+    windows.Erase(handle);
   }
 
   void DrawDecoration(cairo_t* cr, const WindowRecord& record,
@@ -534,7 +362,7 @@ void HeadlessPlatform::Impl::DrawDecoration(cairo_t* cr, const WindowRecord& rec
 void HeadlessPlatform::Impl::Composite(cairo_t* cr, const WindowRecord& record,
                                        const PointT<std::int32_t>& screenOrigin) const {
   if (!record.visible || record.minimized) return;
-  const RectT<std::int32_t> client = ScreenClient(record);
+  const RectT<std::int32_t> client = windows.ScreenClient(record);
   cairo_save(cr);
   cairo_rectangle(cr, client.left - screenOrigin.x, client.top - screenOrigin.y, client.width,
                   client.height);
@@ -544,8 +372,8 @@ void HeadlessPlatform::Impl::Composite(cairo_t* cr, const WindowRecord& record,
                              client.top - screenOrigin.y);
     cairo_paint_with_alpha(cr, std::clamp(static_cast<double>(record.opacity), 0.0, 1.0));
   }
-  for (const PlatformWindow child : ChildrenOf(record.handle)) {
-    Composite(cr, *Find(child), screenOrigin);
+  for (const PlatformWindow child : windows.ChildrenOf(record.handle)) {
+    Composite(cr, *windows.Find(child), screenOrigin);
   }
   cairo_restore(cr);
 }
@@ -716,11 +544,11 @@ void HeadlessPlatform::SetDoubleClickSize(std::int32_t width, std::int32_t heigh
 
 void HeadlessPlatform::UserSetClientRect(PlatformWindow window,
                                          const RectT<std::int32_t>& screenRect) {
-  WindowRecord* record = impl_->Find(window);
+  WindowRecord* record = impl_->windows.Find(window);
   if (record == nullptr) return;
-  const RectT<std::int32_t> before = impl_->ScreenClient(*record);
+  const RectT<std::int32_t> before = impl_->windows.ScreenClient(*record);
   SetClientRect(window, screenRect);
-  const RectT<std::int32_t> after = impl_->ScreenClient(*record);
+  const RectT<std::int32_t> after = impl_->windows.ScreenClient(*record);
   if (after.width != before.width || after.height != before.height) {
     impl_->Post(window, kMsgSize, 0, MakePointParam({after.width, after.height}));
   }
@@ -730,7 +558,7 @@ void HeadlessPlatform::UserSetClientRect(PlatformWindow window,
 }
 
 void HeadlessPlatform::UserClose(PlatformWindow window) {
-  if (impl_->Find(window) != nullptr) impl_->Post(window, kMsgClose);
+  if (impl_->windows.Find(window) != nullptr) impl_->Post(window, kMsgClose);
 }
 
 void HeadlessPlatform::DeactivateApplication() {
@@ -742,10 +570,10 @@ void HeadlessPlatform::DeactivateApplication() {
   const PlatformWindow old = d.active;
   d.active = kNoPlatformWindow;
   d.SetFocus(kNoPlatformWindow);
-  if (d.Find(old) != nullptr) d.Post(old, kMsgActivate, 0);
+  if (d.windows.Find(old) != nullptr) d.Post(old, kMsgActivate, 0);
   if (d.applicationActive) {
     d.applicationActive = false;
-    if (d.Find(old) != nullptr) d.Post(old, kMsgActivateApp, 0);
+    if (d.windows.Find(old) != nullptr) d.Post(old, kMsgActivateApp, 0);
   }
 }
 
@@ -764,43 +592,40 @@ std::vector<PlatformWindow> HeadlessPlatform::GetWindows() const {
   std::vector<PlatformWindow> result;
   std::function<void(PlatformWindow)> add = [&](PlatformWindow handle) {
     result.push_back(handle);
-    for (const PlatformWindow child : impl_->ChildrenOf(handle)) add(child);
+    for (const PlatformWindow child : impl_->windows.ChildrenOf(handle)) add(child);
   };
   for (const PlatformWindow window : impl_->stacking) add(window);
   return result;
 }
 
 std::uint32_t HeadlessPlatform::GetWindowStyle(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   return record != nullptr ? record->style : 0;
 }
 
 std::uint32_t HeadlessPlatform::GetWindowExStyle(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   return record != nullptr ? record->exStyle : 0;
 }
 
 float HeadlessPlatform::GetWindowOpacity(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   return record != nullptr ? record->opacity : 0.0f;
 }
 
 RectT<std::int32_t> HeadlessPlatform::GetPendingPaintBounds(PlatformWindow window) const {
-  RectT<std::int32_t> bounds;
-  if (const WindowRecord* record = impl_->Find(window)) {
-    for (const RectT<std::int32_t>& r : record->pending) bounds = velkcore::Union(bounds, r);
-  }
-  return bounds;
+  const WindowRecord* record = impl_->windows.Find(window);
+  return record != nullptr ? platform::PendingBounds(*record) : RectT<std::int32_t>{};
 }
 
 std::int32_t HeadlessPlatform::GetPaintCount(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   return record != nullptr ? record->paintCount : 0;
 }
 
 boost::intrusive_ptr<pictel::ImageInterface> HeadlessPlatform::GetWindowImage(
     PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   velkcore::RequireInput(record != nullptr);
   return CopyToImage(record->surface.get(), record->client.width, record->client.height);
 }
@@ -827,7 +652,7 @@ boost::intrusive_ptr<pictel::ImageInterface> HeadlessPlatform::RenderScreen() co
     cairo_pattern_destroy(wallpaper);
   }
   for (const PlatformWindow handle : d.stacking) {
-    const WindowRecord& record = *d.Find(handle);
+    const WindowRecord& record = *d.windows.Find(handle);
     if (!record.visible || record.minimized) continue;
     d.DrawDecoration(cr, record, origin);
     d.Composite(cr, record, origin);
@@ -840,7 +665,7 @@ boost::intrusive_ptr<pictel::ImageInterface> HeadlessPlatform::RenderScreen() co
   const pictel::FontP font(*supplier, pictel::GetPlatformUIFontFamily(), u"Bold", 12);
   const pictel::BrushP white(*supplier, {0.95f, 0.96f, 0.98f, 1});
   for (const PlatformWindow handle : d.stacking) {
-    const WindowRecord& record = *d.Find(handle);
+    const WindowRecord& record = *d.windows.Find(handle);
     const Insets insets = InsetsFor(record.style);
     if (!record.visible || record.minimized || insets.top <= insets.left) continue;
     const RectT<std::int32_t> frame = d.ScreenFrame(record);
@@ -858,7 +683,7 @@ boost::intrusive_ptr<pictel::ImageInterface> HeadlessPlatform::RenderScreen() co
 std::vector<std::pair<std::uint32_t, double>> HeadlessPlatform::GetTimers(
     PlatformWindow window) const {
   std::vector<std::pair<std::uint32_t, double>> timers;
-  if (const WindowRecord* record = impl_->Find(window)) {
+  if (const WindowRecord* record = impl_->windows.Find(window)) {
     for (const auto& [id, timer] : record->timers) timers.emplace_back(id, timer.due);
   }
   return timers;
@@ -874,7 +699,7 @@ PlatformWindow HeadlessPlatform::CreateWindow(const WindowCreateParams& params) 
   Impl& d = *impl_;
   velkcore::RequireInput(params.frame.width >= 0 && params.frame.height >= 0);
   const bool child = (params.style & kStyleChild) != 0;
-  const WindowRecord* parent = d.Find(params.parent);
+  const WindowRecord* parent = d.windows.Find(params.parent);
   // A child needs a parent; an owner, when given, must exist.
   velkcore::RequireInput(child ? parent != nullptr
                                : params.parent == kNoPlatformWindow || parent != nullptr);
@@ -887,68 +712,59 @@ PlatformWindow HeadlessPlatform::CreateWindow(const WindowCreateParams& params) 
   record.exStyle = params.exStyle;
   record.visible = (params.style & kStyleVisible) != 0;
   record.enabled = (params.style & kStyleDisabled) == 0;
-  if (child) {
-    const PointT<std::int32_t> base = d.ClientOrigin(*parent);
-    record.client = {params.frame.left - base.x, params.frame.top - base.y, params.frame.width,
-                     params.frame.height};
-  } else {
-    const Insets insets = InsetsFor(params.style);
-    record.client = {params.frame.left + insets.left, params.frame.top + insets.top,
-                     std::max(0, params.frame.width - insets.left - insets.right),
-                     std::max(0, params.frame.height - insets.top - insets.bottom)};
-  }
-  const PlatformWindow handle = record.handle;
-  d.windows.emplace(handle, std::move(record));
+  record.client = child ? d.windows.InParentClient(params.parent, params.frame)
+                        : platform::ClientWithin(params.frame, InsetsFor(params.style));
+  WindowRecord& stored = d.windows.Add(std::move(record));
   if (!child) {
-    d.stacking.push_back(handle);
-    d.Raise(handle);
+    d.stacking.push_back(stored.handle);
+    d.Raise(stored.handle);
   }
-  d.Invalidate(*d.Find(handle), nullptr);
-  return handle;
+  AddPendingArea(stored, nullptr);
+  return stored.handle;
 }
 
 void HeadlessPlatform::DestroyWindow(PlatformWindow window) {
   Impl& d = *impl_;
-  if (d.Find(window) == nullptr) return;
+  if (d.windows.Find(window) == nullptr) return;
   const bool wasActive = d.active == window;
   d.DestroyRecursive(window);
   if (wasActive) d.ActivateNextAfter(window);
 }
 
 bool HeadlessPlatform::IsWindow(PlatformWindow window) const {
-  return impl_->Find(window) != nullptr;
+  return impl_->windows.Find(window) != nullptr;
 }
 
 void HeadlessPlatform::SetWindowTitle(PlatformWindow window, const velkcore::UTF16String& title) {
-  if (WindowRecord* record = impl_->Find(window)) record->title = title;
+  if (WindowRecord* record = impl_->windows.Find(window)) record->title = title;
 }
 
 velkcore::UTF16String HeadlessPlatform::GetWindowTitle(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   return record != nullptr ? record->title : velkcore::UTF16String();
 }
 
 void HeadlessPlatform::ShowWindow(PlatformWindow window, bool show, bool activate) {
   Impl& d = *impl_;
-  WindowRecord* record = d.Find(window);
+  WindowRecord* record = d.windows.Find(window);
   if (record == nullptr) return;
   if (record->visible != show) {
     record->visible = show;
     if (show) {
-      d.Invalidate(*record, nullptr);
+      AddPendingArea(*record, nullptr);
     } else {
-      if (d.IsWithin(d.capture, window)) {
+      if (d.windows.IsWithin(d.capture, window)) {
         d.Post(d.capture, kMsgCaptureLost);
         d.capture = kNoPlatformWindow;
       }
-      if (d.IsWithin(d.hover, window)) {
+      if (d.windows.IsWithin(d.hover, window)) {
         d.PostLeaveIfTracked(d.hover);
         d.hover = kNoPlatformWindow;
       }
       if (!record->child) {
         d.ActivateNextAfter(window);
-      } else if (d.IsWithin(d.focus, window)) {
-        d.SetFocus(d.TopLevelOf(window));
+      } else if (d.windows.IsWithin(d.focus, window)) {
+        d.SetFocus(d.windows.TopLevelOf(window));
       }
     }
   }
@@ -956,24 +772,24 @@ void HeadlessPlatform::ShowWindow(PlatformWindow window, bool show, bool activat
 }
 
 bool HeadlessPlatform::IsWindowVisible(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   return record != nullptr && record->visible;
 }
 
 void HeadlessPlatform::MinimizeWindow(PlatformWindow window, bool minimize) {
   Impl& d = *impl_;
-  WindowRecord* record = d.Find(window);
+  WindowRecord* record = d.windows.Find(window);
   if (record == nullptr || record->child || record->minimized == minimize) return;
   record->minimized = minimize;
   if (minimize) {
     d.ActivateNextAfter(window);
   } else {
-    d.Invalidate(*record, nullptr);
+    AddPendingArea(*record, nullptr);
   }
 }
 
 bool HeadlessPlatform::IsWindowMinimized(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   return record != nullptr && record->minimized;
 }
 
@@ -987,110 +803,94 @@ PlatformWindow HeadlessPlatform::GetActiveWindow() const {
 
 void HeadlessPlatform::EnableWindow(PlatformWindow window, bool enable) {
   Impl& d = *impl_;
-  WindowRecord* record = d.Find(window);
+  WindowRecord* record = d.windows.Find(window);
   if (record == nullptr) return;
   record->enabled = enable;
-  if (!enable && d.IsWithin(d.capture, window)) {
+  if (!enable && d.windows.IsWithin(d.capture, window)) {
     d.Post(d.capture, kMsgCaptureLost);
     d.capture = kNoPlatformWindow;
   }
 }
 
 bool HeadlessPlatform::IsWindowEnabled(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   return record != nullptr && record->enabled;
 }
 
 void HeadlessPlatform::SetWindowOpacity(PlatformWindow window, float opacity) {
   velkcore::RequireInput(std::isfinite(opacity));
-  if (WindowRecord* record = impl_->Find(window)) record->opacity = std::clamp(opacity, 0.0f, 1.0f);
+  if (WindowRecord* record = impl_->windows.Find(window))
+    record->opacity = std::clamp(opacity, 0.0f, 1.0f);
 }
 
 void HeadlessPlatform::SetTransparentColorKey(PlatformWindow window,
                                               const std::optional<pictel::ColorRGBA>& key) {
-  if (WindowRecord* record = impl_->Find(window)) record->colorKey = key;
+  if (WindowRecord* record = impl_->windows.Find(window)) record->colorKey = key;
 }
 
 void HeadlessPlatform::SetWindowParent(PlatformWindow window, PlatformWindow parent) {
   Impl& d = *impl_;
-  WindowRecord* record = d.Find(window);
-  if (record == nullptr || !record->child || d.Find(parent) == nullptr) return;
+  WindowRecord* record = d.windows.Find(window);
+  if (record == nullptr || !record->child || d.windows.Find(parent) == nullptr) return;
   // A window cannot go inside itself.
-  velkcore::RequireInput(!d.IsWithin(parent, window));
+  velkcore::RequireInput(!d.windows.IsWithin(parent, window));
   record->parent = parent;
 }
 
 PlatformWindow HeadlessPlatform::GetWindowParent(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   return record != nullptr ? record->parent : kNoPlatformWindow;
 }
 
 // ---- Geometry ----
 
 RectT<std::int32_t> HeadlessPlatform::GetClientRect(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
-  return record != nullptr ? impl_->ScreenClient(*record) : RectT<std::int32_t>{};
+  const WindowRecord* record = impl_->windows.Find(window);
+  return record != nullptr ? impl_->windows.ScreenClient(*record) : RectT<std::int32_t>{};
 }
 
 void HeadlessPlatform::SetClientRect(PlatformWindow window, const RectT<std::int32_t>& rect) {
   velkcore::RequireInput(rect.width >= 0 && rect.height >= 0);
   Impl& d = *impl_;
-  WindowRecord* record = d.Find(window);
+  WindowRecord* record = d.windows.Find(window);
   if (record == nullptr) return;
-  RectT<std::int32_t> relative = rect;
-  if (record->child) {
-    const WindowRecord* parent = d.Find(record->parent);
-    const PointT<std::int32_t> base =
-        parent != nullptr ? d.ClientOrigin(*parent) : PointT<std::int32_t>{};
-    relative.left -= base.x;
-    relative.top -= base.y;
-  }
-  d.Resize(*record, relative);
+  platform::MoveClient(*record,
+                       record->child ? d.windows.InParentClient(record->parent, rect) : rect);
 }
 
 RectT<std::int32_t> HeadlessPlatform::GetFrameRect(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   return record != nullptr ? impl_->ScreenFrame(*record) : RectT<std::int32_t>{};
 }
 
 void HeadlessPlatform::SetFrameRect(PlatformWindow window, const RectT<std::int32_t>& rect) {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   if (record == nullptr) return;
-  const Insets insets = InsetsFor(record->style);
-  SetClientRect(window, {rect.left + insets.left, rect.top + insets.top,
-                         std::max(0, rect.width - insets.left - insets.right),
-                         std::max(0, rect.height - insets.top - insets.bottom)});
+  SetClientRect(window, platform::ClientWithin(rect, InsetsFor(record->style)));
 }
 
 // ---- Painting ----
 
 void HeadlessPlatform::InvalidateRect(PlatformWindow window,
                                       const RectT<std::int32_t>* clientRect) {
-  if (WindowRecord* record = impl_->Find(window)) impl_->Invalidate(*record, clientRect);
+  if (WindowRecord* record = impl_->windows.Find(window)) AddPendingArea(*record, clientRect);
 }
 
 bool HeadlessPlatform::HasPendingPaint(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
-  return record != nullptr && impl_->IsPaintable(*record);
+  const WindowRecord* record = impl_->windows.Find(window);
+  return record != nullptr && impl_->windows.IsPaintable(*record);
 }
 
 std::optional<PaintTarget> HeadlessPlatform::BeginPaint(PlatformWindow window) {
   Impl& d = *impl_;
-  WindowRecord* record = d.Find(window);
-  if (record == nullptr || !d.IsPaintable(*record)) return std::nullopt;
+  WindowRecord* record = d.windows.Find(window);
+  if (record == nullptr || !d.windows.IsPaintable(*record)) return std::nullopt;
   d.EnsureSurface(*record);
-  PaintTarget target;
-  target.context = record->surface.get();
-  target.rects = std::move(record->pending);
-  record->pending.clear();
-  for (const RectT<std::int32_t>& r : target.rects)
-    target.bounds = velkcore::Union(target.bounds, r);
-  ++record->paintCount;
-  return target;
+  return platform::TakePendingPaint(*record, record->surface.get());
 }
 
 void HeadlessPlatform::EndPaint(PlatformWindow window, const PaintTarget&) {
-  if (WindowRecord* record = impl_->Find(window)) {
+  if (WindowRecord* record = impl_->windows.Find(window)) {
     if (record->surface) cairo_surface_flush(record->surface.get());
   }
 }
@@ -1099,7 +899,7 @@ void HeadlessPlatform::EndPaint(PlatformWindow window, const PaintTarget&) {
 
 void HeadlessPlatform::SetCapture(PlatformWindow window) {
   Impl& d = *impl_;
-  if (d.Find(window) == nullptr || d.capture == window) return;
+  if (d.windows.Find(window) == nullptr || d.capture == window) return;
   if (d.capture != kNoPlatformWindow) d.Post(d.capture, kMsgCaptureLost);
   d.capture = window;
 }
@@ -1118,7 +918,7 @@ PlatformWindow HeadlessPlatform::GetCapture() const {
 }
 
 void HeadlessPlatform::SetFocus(PlatformWindow window) {
-  if (window != kNoPlatformWindow && impl_->Find(window) == nullptr) return;
+  if (window != kNoPlatformWindow && impl_->windows.Find(window) == nullptr) return;
   impl_->SetFocus(window);
 }
 
@@ -1135,7 +935,7 @@ PlatformWindow HeadlessPlatform::GetWindowFromPoint(const PointT<std::int32_t>& 
 }
 
 void HeadlessPlatform::TrackPointerLeave(PlatformWindow window) {
-  if (WindowRecord* record = impl_->Find(window)) record->trackLeave = true;
+  if (WindowRecord* record = impl_->windows.Find(window)) record->trackLeave = true;
 }
 
 bool HeadlessPlatform::HasPendingPointerMove(PlatformWindow window) const {
@@ -1194,7 +994,7 @@ double HeadlessPlatform::GetTime() const {
 void HeadlessPlatform::SetTimer(PlatformWindow window, std::uint32_t id,
                                 std::uint32_t milliseconds) {
   Impl& d = *impl_;
-  WindowRecord* record = d.Find(window);
+  WindowRecord* record = d.windows.Find(window);
   if (record == nullptr) return;
   const std::uint32_t interval = std::max(milliseconds, kMinimumTimerInterval);
   record->timers[id] = Timer{interval, d.now + static_cast<double>(interval) / 1000.0};
@@ -1202,7 +1002,7 @@ void HeadlessPlatform::SetTimer(PlatformWindow window, std::uint32_t id,
 
 void HeadlessPlatform::KillTimer(PlatformWindow window, std::uint32_t id) {
   Impl& d = *impl_;
-  WindowRecord* record = d.Find(window);
+  WindowRecord* record = d.windows.Find(window);
   if (record == nullptr) return;
   record->timers.erase(id);
   std::erase_if(d.queue, [window, id](const OS_Event& e) {
@@ -1226,7 +1026,7 @@ bool HeadlessPlatform::GetNextEvent(OS_Event& event, bool) {
   if (d.queue.empty()) d.PostDueTimer();
   if (d.queue.empty()) {
     for (const PlatformWindow handle : GetWindows()) {
-      if (d.IsPaintable(*d.Find(handle))) {
+      if (d.windows.IsPaintable(*d.windows.Find(handle))) {
         event = OS_Event(handle, kMsgPaint, 0, 0, d.now);
         return true;
       }

@@ -100,13 +100,14 @@ void X11Platform::Impl::HandleEvent(XEvent& event) {
       HandleConfigure(event.xconfigure);
       break;
     case ReparentNotify:
-      if (WindowRecord* record = Find(event.xreparent.window)) {
+      if (WindowRecord* record = windows.Find(event.xreparent.window)) {
         if (!record->child) record->reparented = event.xreparent.parent != connection.Root();
       }
       break;
     case UnmapNotify:
       // Iconified by the window manager, say: an unmapped window keeps no capture.
-      if (capture != kNoPlatformWindow && IsWithin(capture, event.xunmap.window)) LoseCapture();
+      if (capture != kNoPlatformWindow && windows.IsWithin(capture, event.xunmap.window))
+        LoseCapture();
       break;
     case FocusIn:
     case FocusOut:
@@ -129,7 +130,7 @@ void X11Platform::Impl::HandleEvent(XEvent& event) {
 
 void X11Platform::Impl::HandleButton(const XButtonEvent& event, bool press) {
   lastInputTime = event.time;
-  if (Find(event.window) == nullptr) return;
+  if (windows.Find(event.window) == nullptr) return;
   const PointT<std::int32_t> screen{event.x_root, event.y_root};
   const PointT<std::int32_t> at{event.x, event.y};
   if (event.button >= 4 && event.button <= 7) {
@@ -138,7 +139,7 @@ void X11Platform::Impl::HandleButton(const XButtonEvent& event, bool press) {
     const bool horizontal = event.button >= 6;
     const std::int32_t delta = event.button == 4 || event.button == 7 ? 120 : -120;
     PlatformWindow target = focus != kNoPlatformWindow ? focus : active;
-    if (!IsEnabledForInput(target)) target = PointerTarget(event.window, at, screen);
+    if (!windows.IsEnabledForInput(target)) target = PointerTarget(event.window, at, screen);
     if (target == kNoPlatformWindow) return;
     Enqueue(
         {OS_Event(target, horizontal ? kMsgHorizontalWheel : kMsgWheel,
@@ -180,7 +181,7 @@ void X11Platform::Impl::HandleButton(const XButtonEvent& event, bool press) {
 
 void X11Platform::Impl::HandleMotion(const XMotionEvent& event) {
   lastInputTime = event.time;
-  if (Find(event.window) == nullptr) return;
+  if (windows.Find(event.window) == nullptr) return;
   const PointT<std::int32_t> screen{event.x_root, event.y_root};
   const PointT<std::int32_t> at{event.x, event.y};
   const PlatformWindow target = PointerTarget(event.window, at, screen);
@@ -202,7 +203,7 @@ void X11Platform::Impl::HandleMotion(const XMotionEvent& event) {
 }
 
 void X11Platform::Impl::HandleCrossing(const XCrossingEvent& event) {
-  if (Find(event.window) == nullptr) return;
+  if (windows.Find(event.window) == nullptr) return;
   // Crossings that a grab of ours causes are not the pointer leaving.
   if (event.mode == NotifyGrab) return;
   if (event.type == EnterNotify) {
@@ -222,11 +223,12 @@ void X11Platform::Impl::HandleKey(XKeyEvent& event, bool press) {
   const bool wasDown = keycodeDown[code];
   keycodeDown[code] = press;
   PlatformWindow target = focus != kNoPlatformWindow ? focus : active;
-  if (!IsEnabledForInput(target)) target = kNoPlatformWindow;
+  if (!windows.IsEnabledForInput(target)) target = kNoPlatformWindow;
   const x11::KeyIdentity key = keyboard.Identify(event.keycode, event.state);
   std::u16string text;
   if (press) {
-    const WindowRecord* top = Find(TopLevelOf(target != kNoPlatformWindow ? target : event.window));
+    const WindowRecord* top =
+        windows.Find(windows.TopLevelOf(target != kNoPlatformWindow ? target : event.window));
     text = keyboard.TextOf(event, top != nullptr ? top->inputContext.get() : nullptr, key);
   }
   if (target == kNoPlatformWindow) return;
@@ -258,19 +260,19 @@ void X11Platform::Impl::HandleKey(XKeyEvent& event, bool press) {
 // ---- Painting and geometry ----
 
 void X11Platform::Impl::HandleExpose(const XExposeEvent& event) {
-  WindowRecord* record = Find(event.window);
+  WindowRecord* record = windows.Find(event.window);
   if (record == nullptr) return;
   const RectT<std::int32_t> area{event.x, event.y, event.width, event.height};
   // A complete back buffer answers at once; otherwise the area is painted anew.
   if (record->buffer && record->buffer->IsComplete()) {
     record->buffer->Present({area});
   } else {
-    Invalidate(*record, &area);
+    AddPendingArea(*record, &area);
   }
 }
 
 void X11Platform::Impl::HandleConfigure(const XConfigureEvent& event) {
-  WindowRecord* record = Find(event.window);
+  WindowRecord* record = windows.Find(event.window);
   if (record == nullptr || record->child) return;
   RectT<std::int32_t> reported{event.x, event.y, event.width, event.height};
   if (record->reparented && !event.send_event) {
@@ -333,7 +335,7 @@ void X11Platform::Impl::ReadWindowState(WindowRecord& record) {
       if (active == record.handle) ActivateNextAfter(record.handle);
     } else if (state == NormalState && record.minimized) {
       record.minimized = false;
-      Invalidate(record, nullptr);
+      AddPendingArea(record, nullptr);
     }
   }
   if (data != nullptr) XFree(data);
@@ -346,7 +348,7 @@ void X11Platform::Impl::HandleProperty(const XPropertyEvent& event) {
     if (event.atom == atoms.netSupportingWmCheck) connection.RefreshWindowManager();
     return;
   }
-  WindowRecord* record = Find(event.window);
+  WindowRecord* record = windows.Find(event.window);
   if (record == nullptr) return;
   if (event.atom == atoms.netFrameExtents) ReadFrameExtentsOf(record->handle, record->frame);
   if (event.atom == atoms.wmState) ReadWindowState(*record);
@@ -357,7 +359,7 @@ void X11Platform::Impl::HandleClientMessage(const XClientMessageEvent& event) {
   if (event.message_type != atoms.wmProtocols || event.format != 32) return;
   const auto protocol = static_cast<Atom>(event.data.l[0]);
   if (protocol == atoms.wmDeleteWindow) {
-    if (Find(event.window) != nullptr) Post(event.window, kMsgClose);
+    if (windows.Find(event.window) != nullptr) Post(event.window, kMsgClose);
   } else if (protocol == atoms.netWmPing) {
     XClientMessageEvent pong = event;
     pong.window = connection.Root();
@@ -373,9 +375,10 @@ void X11Platform::Impl::ReconcileFocus() {
   Window focused = None;
   int revert = 0;
   XGetInputFocus(display, &focused, &revert);
-  const PlatformWindow top = Find(focused) != nullptr ? TopLevelOf(focused) : kNoPlatformWindow;
+  const PlatformWindow top =
+      windows.Find(focused) != nullptr ? windows.TopLevelOf(focused) : kNoPlatformWindow;
   if (top != kNoPlatformWindow) {
-    const WindowRecord* record = Find(top);
+    const WindowRecord* record = windows.Find(top);
     if (top != active && record->visible && (record->exStyle & kExStyleNoActivate) == 0) {
       // A window blocked by a modal run (the user clicked it, and the window
       // manager focused it) hands the activation, and the server's focus, to
@@ -397,7 +400,7 @@ void X11Platform::Impl::ReconcileFocus() {
 
 void X11Platform::Impl::DisplayChanged() {
   monitorsValid = false;
-  for (const PlatformWindow window : TopLevels()) Post(window, kMsgDisplayChange);
+  for (const PlatformWindow window : windows.TopLevels()) Post(window, kMsgDisplayChange);
 }
 
 }  // namespace velkui::ui

@@ -12,6 +12,8 @@
 #include <velkcore/Strings.h>
 #include <velkui/ui/PlatformTypes.h>
 
+#include "../common/KeyTable.h"
+
 namespace velkui::ui::x11 {
 
 namespace {
@@ -218,29 +220,6 @@ char32_t UnicodeOfKeysym(KeySym keysym) {
   }
 }
 
-// What Control with a key types on the desktop.
-char16_t ControlCharacter(std::int16_t virtualKey) {
-  if (virtualKey >= 'A' && virtualKey <= 'Z') return static_cast<char16_t>(virtualKey - 'A' + 1);
-  switch (virtualKey) {
-    case 219:
-      return 27;
-    case 220:
-      return 28;
-    case 221:
-      return 29;
-    case vk::kReturn:
-      return 10;
-    case vk::kBackspace:
-      return 127;
-    case vk::kSpace:
-      return u' ';
-    case vk::kEscape:
-      return 27;
-    default:
-      return 0;
-  }
-}
-
 void AppendUTF32(std::u16string& text, char32_t c) {
   if (c == 0) return;
   if (c >= 0x10000 && c <= 0x10FFFF) {
@@ -336,7 +315,7 @@ std::u16string X11Keyboard::TextOf(XKeyEvent& event, XIC context, const KeyIdent
   const bool control = (event.state & ControlMask) != 0;
   if (control) {
     std::u16string text;
-    if (const char16_t c = ControlCharacter(key.virtualKey)) text.push_back(c);
+    if (const char16_t c = platform::ControlCharacter(key.virtualKey)) text.push_back(c);
     return text;
   }
   std::u16string text;

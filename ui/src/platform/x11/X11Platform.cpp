@@ -14,14 +14,15 @@
 #include <cstring>
 
 #include <velkcore/Error.h>
-#include <velkui/pictel/OSSupplier.h>
-#include <velkui/pictel/SupplierInterface.h>
 
+#include "../common/PixelBuffer.h"
 #include "X11Monitors.h"
 #include "X11PlatformImpl.h"
 
 namespace velkui::ui {
 
+using platform::AddPendingArea;
+using platform::ClientWithin;
 using velkcore::PointT;
 using velkcore::RectT;
 using x11::Insets;
@@ -29,9 +30,6 @@ using x11::QueuedMessage;
 using x11::WindowRecord;
 
 namespace {
-
-// More separate pending rectangles than this are merged into their bounds.
-constexpr std::size_t kMaxPendingRects = 16;
 
 constexpr long kTopLevelEvents = ExposureMask | StructureNotifyMask | PropertyChangeMask |
                                  FocusChangeMask | ButtonPressMask | ButtonReleaseMask |
@@ -58,11 +56,6 @@ constexpr long kMotifDecorMenu = 1L << 4;
 constexpr long kMotifDecorMinimize = 1L << 5;
 constexpr long kMotifDecorMaximize = 1L << 6;
 
-bool Contains(const RectT<std::int32_t>& outer, const RectT<std::int32_t>& inner) {
-  return inner.left >= outer.left && inner.top >= outer.top && inner.Right() <= outer.Right() &&
-         inner.Bottom() <= outer.Bottom();
-}
-
 bool HasCaption(std::uint32_t style) {
   return (style & kStyleCaption) == kStyleCaption;
 }
@@ -82,40 +75,6 @@ void SetAtomProperty(Display* display, Window window, Atom property, Atom type,
   XChangeProperty(display, window, property, type, 32, PropModeReplace,
                   reinterpret_cast<const unsigned char*>(values.data()),
                   static_cast<int>(values.size()));
-}
-
-std::int16_t ButtonVirtualKey(std::uint32_t message) {
-  switch (message) {
-    case kMsgLeftButtonDown:
-    case kMsgLeftButtonUp:
-    case kMsgLeftButtonDoubleClick:
-      return vk::kLeftButton;
-    case kMsgMiddleButtonDown:
-    case kMsgMiddleButtonUp:
-    case kMsgMiddleButtonDoubleClick:
-      return vk::kMiddleButton;
-    case kMsgRightButtonDown:
-    case kMsgRightButtonUp:
-    case kMsgRightButtonDoubleClick:
-      return vk::kRightButton;
-    default:
-      return 0;
-  }
-}
-
-bool IsButtonUp(std::uint32_t message) {
-  return message == kMsgLeftButtonUp || message == kMsgMiddleButtonUp ||
-         message == kMsgRightButtonUp;
-}
-
-bool IsLockKey(std::int16_t key) {
-  return key == vk::kCapsLock || key == vk::kNumLock || key == vk::kScrollLock;
-}
-
-void SyncGenericModifiers(std::array<KeyState, 256>& keys) {
-  keys[vk::kShift].down = keys[vk::kLeftShift].down || keys[vk::kRightShift].down;
-  keys[vk::kControl].down = keys[vk::kLeftControl].down || keys[vk::kRightControl].down;
-  keys[vk::kAlt].down = keys[vk::kLeftAlt].down || keys[vk::kRightAlt].down;
 }
 
 // A window with a modal frame and an owner: a dialog the window manager keeps
@@ -192,89 +151,14 @@ X11Platform::Impl::Impl()
 X11Platform::Impl::~Impl() {
   if (capture != kNoPlatformWindow) XUngrabPointer(display, CurrentTime);
   // Surfaces and input contexts go before the windows they draw on.
-  const std::vector<PlatformWindow> tops = TopLevels();
-  windows.clear();
+  const std::vector<PlatformWindow> tops = windows.TopLevels();
+  windows.Clear();
   for (const PlatformWindow top : tops) XDestroyWindow(display, top);
   XSync(display, False);
 }
 
-WindowRecord* X11Platform::Impl::Find(PlatformWindow handle) {
-  const auto found = windows.find(handle);
-  return found != windows.end() ? &found->second : nullptr;
-}
-
-const WindowRecord* X11Platform::Impl::Find(PlatformWindow handle) const {
-  const auto found = windows.find(handle);
-  return found != windows.end() ? &found->second : nullptr;
-}
-
-PointT<std::int32_t> X11Platform::Impl::ClientOrigin(const WindowRecord& record) const {
-  PointT<std::int32_t> origin{record.client.left, record.client.top};
-  if (record.child) {
-    if (const WindowRecord* parent = Find(record.parent)) {
-      const PointT<std::int32_t> base = ClientOrigin(*parent);
-      origin.x += base.x;
-      origin.y += base.y;
-    }
-  }
-  return origin;
-}
-
-RectT<std::int32_t> X11Platform::Impl::ScreenClient(const WindowRecord& record) const {
-  const PointT<std::int32_t> origin = ClientOrigin(record);
-  return {origin.x, origin.y, record.client.width, record.client.height};
-}
-
 RectT<std::int32_t> X11Platform::Impl::ScreenFrame(const WindowRecord& record) const {
-  const RectT<std::int32_t> client = ScreenClient(record);
-  const Insets& f = record.frame;
-  return {client.left - f.left, client.top - f.top, client.width + f.left + f.right,
-          client.height + f.top + f.bottom};
-}
-
-bool X11Platform::Impl::IsShownOnScreen(const WindowRecord& record) const {
-  if (!record.visible || record.minimized) return false;
-  if (!record.child) return true;
-  const WindowRecord* parent = Find(record.parent);
-  return parent != nullptr && IsShownOnScreen(*parent);
-}
-
-bool X11Platform::Impl::IsEnabledForInput(PlatformWindow handle) const {
-  for (const WindowRecord* record = Find(handle); record != nullptr;
-       record = record->child ? Find(record->parent) : nullptr) {
-    if (!record->enabled) return false;
-  }
-  return Find(handle) != nullptr;
-}
-
-PlatformWindow X11Platform::Impl::TopLevelOf(PlatformWindow handle) const {
-  const WindowRecord* record = Find(handle);
-  while (record != nullptr && record->child) record = Find(record->parent);
-  return record != nullptr ? record->handle : kNoPlatformWindow;
-}
-
-bool X11Platform::Impl::IsWithin(PlatformWindow handle, PlatformWindow ancestor) const {
-  for (const WindowRecord* record = Find(handle); record != nullptr;
-       record = record->child ? Find(record->parent) : nullptr) {
-    if (record->handle == ancestor) return true;
-  }
-  return false;
-}
-
-std::vector<PlatformWindow> X11Platform::Impl::ChildrenOf(PlatformWindow handle) const {
-  std::vector<PlatformWindow> children;
-  for (const auto& [h, record] : windows) {
-    if (record.child && record.parent == handle) children.push_back(h);
-  }
-  return children;
-}
-
-std::vector<PlatformWindow> X11Platform::Impl::TopLevels() const {
-  std::vector<PlatformWindow> tops;
-  for (const auto& [h, record] : windows) {
-    if (!record.child) tops.push_back(h);
-  }
-  return tops;
+  return platform::FrameAround(windows.ScreenClient(record), record.frame);
 }
 
 // ---- Impl: queue ----
@@ -308,7 +192,7 @@ void X11Platform::Impl::SyncModifiers(unsigned state, bool locks) {
   sync((state & ControlMask) != 0, vk::kLeftControl, vk::kRightControl);
   // AltGr (the right Alt of most layouts) is Mod5, not Mod1.
   sync((state & (Mod1Mask | Mod5Mask)) != 0, vk::kLeftAlt, vk::kRightAlt);
-  SyncGenericModifiers(keys);
+  platform::SyncGenericModifiers(keys);
   if (!locks) return;
   keys[vk::kCapsLock].toggled = (state & LockMask) != 0;
   if (keyboard.NumLockMask() != 0) {
@@ -317,65 +201,24 @@ void X11Platform::Impl::SyncModifiers(unsigned state, bool locks) {
 }
 
 void X11Platform::Impl::UpdateKeyState(const QueuedMessage& message) {
-  const std::uint32_t msg = message.event.GetMsg();
-  const bool isKey = msg >= kMsgKeyDown && msg <= kMsgSysKeyUp;
+  const OS_Event& event = message.event;
+  const std::uint32_t msg = event.GetMsg();
   if (message.modifierState) {
-    const bool lockKey =
-        isKey && IsLockKey(static_cast<std::int16_t>(message.event.GetWParam() & 0xFFu));
-    SyncModifiers(*message.modifierState, !lockKey);
+    // The state of a lock key's release may still show the lock it is about
+    // to change; before a press it is the lock's state until now.
+    const bool lockKeyRelease =
+        (msg == kMsgKeyUp || msg == kMsgSysKeyUp) &&
+        platform::IsLockKey(static_cast<std::int16_t>(event.GetWParam() & 0xFFu));
+    SyncModifiers(*message.modifierState, !lockKeyRelease);
   }
-  if (const std::int16_t button = ButtonVirtualKey(msg)) {
-    keys[static_cast<std::size_t>(button)].down = !IsButtonUp(msg);
-    return;
-  }
-  if (!isKey) return;
-  const bool down = msg == kMsgKeyDown || msg == kMsgSysKeyDown;
-  if (message.modifierState && down &&
-      IsLockKey(static_cast<std::int16_t>(message.event.GetWParam() & 0xFFu))) {
-    // The state before the press is the lock's state until now.
-    SyncModifiers(*message.modifierState, true);
-  }
-  const KeyData data = GetKeyParam(message.event.GetLParam());
-  const auto key = static_cast<std::size_t>(message.event.GetWParam() & 0xFFu);
-  const auto side = static_cast<std::size_t>(message.sideKey & 0xFF);
-  if (down && !data.previouslyDown && IsLockKey(static_cast<std::int16_t>(key))) {
-    keys[key].toggled = !keys[key].toggled;
-  }
-  keys[key].down = down;
-  keys[side].down = down;
-  SyncGenericModifiers(keys);
-}
-
-bool X11Platform::Impl::IsPaintable(const WindowRecord& record) const {
-  return !record.pending.empty() && IsShownOnScreen(record) && record.client.width > 0 &&
-         record.client.height > 0;
-}
-
-void X11Platform::Impl::Invalidate(WindowRecord& record, const RectT<std::int32_t>* rect) {
-  const RectT<std::int32_t> whole{0, 0, record.client.width, record.client.height};
-  const RectT<std::int32_t> area = rect != nullptr ? velkcore::Intersection(whole, *rect) : whole;
-  if (area.IsEmpty()) return;
-  for (const RectT<std::int32_t>& existing : record.pending) {
-    if (Contains(existing, area)) return;
-  }
-  std::erase_if(record.pending,
-                [&area](const RectT<std::int32_t>& existing) { return Contains(area, existing); });
-  record.pending.push_back(area);
-  if (record.pending.size() > kMaxPendingRects) {
-    RectT<std::int32_t> bounds;
-    for (const RectT<std::int32_t>& r : record.pending) bounds = velkcore::Union(bounds, r);
-    record.pending = {bounds};
-  }
+  if (platform::ApplyButtonMessage(keys, msg)) return;
+  platform::ApplyKeyMessage(keys, event, message.sideKey);
 }
 
 void X11Platform::Impl::ApplyClientRect(WindowRecord& record, const RectT<std::int32_t>& relative) {
-  const bool resized =
-      relative.width != record.client.width || relative.height != record.client.height;
-  record.client = relative;
-  if (!resized) return;
-  if (record.buffer) record.buffer->Resize(relative.width, relative.height);
-  record.pending.clear();
-  Invalidate(record, nullptr);
+  if (platform::MoveClient(record, relative) && record.buffer) {
+    record.buffer->Resize(relative.width, relative.height);
+  }
 }
 
 bool X11Platform::Impl::HasMessage() {
@@ -383,7 +226,7 @@ bool X11Platform::Impl::HasMessage() {
   const std::optional<double> due = timers.NextDue();
   if (due && *due <= Now()) return true;
   return std::any_of(windows.begin(), windows.end(),
-                     [this](const auto& entry) { return IsPaintable(entry.second); });
+                     [this](const auto& entry) { return windows.IsPaintable(entry.second); });
 }
 
 bool X11Platform::Impl::Wait(double seconds) {
@@ -401,19 +244,19 @@ void X11Platform::Impl::SetFocus(PlatformWindow handle) {
   if (handle == focus) return;
   const PlatformWindow old = focus;
   focus = handle;
-  const WindowRecord* oldTop = Find(TopLevelOf(old));
-  const WindowRecord* newTop = Find(TopLevelOf(handle));
+  const WindowRecord* oldTop = windows.Find(windows.TopLevelOf(old));
+  const WindowRecord* newTop = windows.Find(windows.TopLevelOf(handle));
   if (oldTop != newTop) {
     if (oldTop != nullptr && oldTop->inputContext) XUnsetICFocus(oldTop->inputContext.get());
     if (newTop != nullptr && newTop->inputContext) XSetICFocus(newTop->inputContext.get());
   }
-  if (Find(old) != nullptr) Post(old, kMsgKillFocus, handle);
+  if (windows.Find(old) != nullptr) Post(old, kMsgKillFocus, handle);
   if (handle != kNoPlatformWindow) Post(handle, kMsgSetFocus, old);
 }
 
 void X11Platform::Impl::Activate(PlatformWindow handle, bool byClick, bool askServer) {
-  const PlatformWindow top = TopLevelOf(handle);
-  const WindowRecord* record = Find(top);
+  const PlatformWindow top = windows.TopLevelOf(handle);
+  const WindowRecord* record = windows.Find(top);
   if (record == nullptr || !record->visible || (record->exStyle & kExStyleNoActivate) != 0) {
     return;
   }
@@ -439,37 +282,37 @@ void X11Platform::Impl::Activate(PlatformWindow handle, bool byClick, bool askSe
   if (active != top) {
     const PlatformWindow old = active;
     active = top;
-    if (Find(old) != nullptr) Post(old, kMsgActivate, 0);
+    if (windows.Find(old) != nullptr) Post(old, kMsgActivate, 0);
     if (!applicationActive) {
       applicationActive = true;
       Post(top, kMsgActivateApp, 1);
     }
     Post(top, kMsgActivate, byClick ? 2 : 1);
   }
-  if (!IsWithin(focus, top)) SetFocus(top);
+  if (!windows.IsWithin(focus, top)) SetFocus(top);
 }
 
 void X11Platform::Impl::ActivateNextAfter(PlatformWindow leaving) {
   if (active != leaving) return;
   active = kNoPlatformWindow;
   for (auto it = activationOrder.rbegin(); it != activationOrder.rend(); ++it) {
-    const WindowRecord* record = Find(*it);
+    const WindowRecord* record = windows.Find(*it);
     if (*it != leaving && record != nullptr && record->visible && !record->minimized &&
         (record->exStyle & kExStyleNoActivate) == 0) {
       Activate(*it, false, true);
       return;
     }
   }
-  if (IsWithin(focus, leaving)) SetFocus(kNoPlatformWindow);
+  if (windows.IsWithin(focus, leaving)) SetFocus(kNoPlatformWindow);
   if (applicationActive) {
     applicationActive = false;
-    if (Find(leaving) != nullptr) Post(leaving, kMsgActivateApp, 0);
+    if (windows.Find(leaving) != nullptr) Post(leaving, kMsgActivateApp, 0);
   }
 }
 
 PlatformWindow X11Platform::Impl::UsableWindowInsteadOf(PlatformWindow blocked) const {
   for (auto it = activationOrder.rbegin(); it != activationOrder.rend(); ++it) {
-    const WindowRecord* record = Find(*it);
+    const WindowRecord* record = windows.Find(*it);
     if (*it != blocked && record != nullptr && record->visible && !record->minimized &&
         record->enabled && (record->exStyle & kExStyleNoActivate) == 0) {
       return *it;
@@ -483,15 +326,15 @@ void X11Platform::Impl::DeactivateApplication() {
   const PlatformWindow old = active;
   active = kNoPlatformWindow;
   SetFocus(kNoPlatformWindow);
-  if (Find(old) != nullptr) Post(old, kMsgActivate, 0);
+  if (windows.Find(old) != nullptr) Post(old, kMsgActivate, 0);
   if (applicationActive) {
     applicationActive = false;
-    if (Find(old) != nullptr) Post(old, kMsgActivateApp, 0);
+    if (windows.Find(old) != nullptr) Post(old, kMsgActivateApp, 0);
   }
 }
 
 void X11Platform::Impl::PostLeaveIfTracked(PlatformWindow handle) {
-  WindowRecord* record = Find(handle);
+  WindowRecord* record = windows.Find(handle);
   if (record == nullptr || !record->trackLeave) return;
   record->trackLeave = false;
   Post(handle, kMsgPointerLeft);
@@ -501,7 +344,7 @@ void X11Platform::Impl::LoseCapture() {
   const PlatformWindow old = capture;
   capture = kNoPlatformWindow;
   XUngrabPointer(display, CurrentTime);
-  if (Find(old) != nullptr) Post(old, kMsgCaptureLost);
+  if (windows.Find(old) != nullptr) Post(old, kMsgCaptureLost);
 }
 
 bool X11Platform::Impl::WaitForFrameExtents(Window window) {
@@ -538,7 +381,7 @@ PlatformWindow X11Platform::Impl::WindowAtScreen(const PointT<std::int32_t>& poi
       break;
     }
     current = child;
-    if (Find(child) != nullptr) found = child;
+    if (windows.Find(child) != nullptr) found = child;
   }
   return found;
 }
@@ -558,13 +401,13 @@ PlatformWindow X11Platform::Impl::PointerTarget(PlatformWindow eventWindow,
                                                 const PointT<std::int32_t>& eventPoint,
                                                 const PointT<std::int32_t>& screen) const {
   if (capture != kNoPlatformWindow) return capture;
-  const WindowRecord* record = Find(eventWindow);
+  const WindowRecord* record = windows.Find(eventWindow);
   const bool inside = record != nullptr && eventPoint.x >= 0 && eventPoint.y >= 0 &&
                       eventPoint.x < record->client.width && eventPoint.y < record->client.height;
   // A press holds the pointer in its window; outside it, the event belongs to
   // the window under the pointer.
   const PlatformWindow under = inside ? eventWindow : WindowAtScreen(screen);
-  return IsEnabledForInput(under) ? under : kNoPlatformWindow;
+  return windows.IsEnabledForInput(under) ? under : kNoPlatformWindow;
 }
 
 PointT<std::int32_t> X11Platform::Impl::ClientPoint(PlatformWindow target,
@@ -572,15 +415,15 @@ PointT<std::int32_t> X11Platform::Impl::ClientPoint(PlatformWindow target,
                                                     const PointT<std::int32_t>& eventPoint,
                                                     const PointT<std::int32_t>& screen) const {
   if (target == eventWindow) return eventPoint;
-  const WindowRecord* record = Find(target);
+  const WindowRecord* record = windows.Find(target);
   if (record == nullptr) return eventPoint;
-  const PointT<std::int32_t> origin = ClientOrigin(*record);
+  const PointT<std::int32_t> origin = windows.ClientOrigin(*record);
   return {screen.x - origin.x, screen.y - origin.y};
 }
 
 void X11Platform::Impl::ApplyCursor() {
   const Cursor shape = cursors.Get(cursor);
-  for (const PlatformWindow top : TopLevels()) XDefineCursor(display, top, shape);
+  for (const PlatformWindow top : windows.TopLevels()) XDefineCursor(display, top, shape);
   if (capture != kNoPlatformWindow) {
     XChangeActivePointerGrab(display, kGrabEvents, shape, CurrentTime);
   }
@@ -627,20 +470,12 @@ void X11Platform::Sync() {
 boost::intrusive_ptr<pictel::ImageInterface> X11Platform::CaptureWindowPixels(
     PlatformWindow window) const {
   const Impl& d = *impl_;
-  const WindowRecord* record = d.Find(window);
+  const WindowRecord* record = d.windows.Find(window);
   velkcore::RequireInput(record != nullptr);
-  const std::int32_t width = std::max(record->client.width, 1);
-  const std::int32_t height = std::max(record->client.height, 1);
+  platform::PixelBuffer pixels(record->client.width, record->client.height);
   XSync(d.display, False);
-  XImage* image = XGetImage(d.display, window, 0, 0, static_cast<unsigned>(width),
-                            static_cast<unsigned>(height), AllPlanes, ZPixmap);
-  const std::int32_t stride = width * 4;
-  auto* pixels =
-      static_cast<unsigned char*>(std::calloc(static_cast<std::size_t>(stride) * height, 1));
-  if (pixels == nullptr) {
-    if (image != nullptr) XDestroyImage(image);
-    throw std::bad_alloc();
-  }
+  XImage* image = XGetImage(d.display, window, 0, 0, static_cast<unsigned>(pixels.Width()),
+                            static_cast<unsigned>(pixels.Height()), AllPlanes, ZPixmap);
   if (image != nullptr) {
     const auto channel = [](unsigned long pixel, unsigned long mask) -> std::uint32_t {
       if (mask == 0) return 0;
@@ -649,10 +484,9 @@ boost::intrusive_ptr<pictel::ImageInterface> X11Platform::CaptureWindowPixels(
       const unsigned long max = mask >> shift;
       return static_cast<std::uint32_t>(((pixel & mask) >> shift) * 255u / max);
     };
-    for (std::int32_t y = 0; y < height; ++y) {
-      auto* row =
-          reinterpret_cast<std::uint32_t*>(pixels + static_cast<std::ptrdiff_t>(y) * stride);
-      for (std::int32_t x = 0; x < width; ++x) {
+    for (std::int32_t y = 0; y < pixels.Height(); ++y) {
+      auto* row = reinterpret_cast<std::uint32_t*>(pixels.Row(y));
+      for (std::int32_t x = 0; x < pixels.Width(); ++x) {
         const unsigned long pixel = XGetPixel(image, x, y);
         row[x] = 0xFF000000u | (channel(pixel, image->red_mask) << 16) |
                  (channel(pixel, image->green_mask) << 8) | channel(pixel, image->blue_mask);
@@ -660,19 +494,12 @@ boost::intrusive_ptr<pictel::ImageInterface> X11Platform::CaptureWindowPixels(
     }
     XDestroyImage(image);
   }
-  const boost::intrusive_ptr<pictel::SupplierInterface> supplier = pictel::NewOSSupplier();
-  try {
-    return supplier->NewBufferImage(width, height, stride, pictel::PixelLayout::kBGRAPremultiplied,
-                                    pixels, [](void* p) { std::free(p); });
-  } catch (...) {
-    std::free(pixels);
-    throw;
-  }
+  return pixels.ToImage();
 }
 
 void X11Platform::ResizeFromOutside(PlatformWindow window, const RectT<std::int32_t>& client) {
   velkcore::RequireInput(client.width > 0 && client.height > 0);
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   velkcore::RequireInput(record != nullptr && !record->child);
   const x11::X11Connection other(DisplayString(impl_->display));
   XMoveResizeWindow(other.Get(), window, client.left, client.top,
@@ -689,7 +516,7 @@ std::string X11Platform::GetDisplayName() const {
 }
 
 std::int32_t X11Platform::GetPaintCount(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   return record != nullptr ? record->paintCount : 0;
 }
 
@@ -699,7 +526,7 @@ PlatformWindow X11Platform::CreateWindow(const WindowCreateParams& params) {
   Impl& d = *impl_;
   velkcore::RequireInput(params.frame.width >= 0 && params.frame.height >= 0);
   const bool child = (params.style & kStyleChild) != 0;
-  const WindowRecord* parent = d.Find(params.parent);
+  const WindowRecord* parent = d.windows.Find(params.parent);
   velkcore::RequireInput(child ? parent != nullptr
                                : params.parent == kNoPlatformWindow || parent != nullptr);
   const x11::X11Atoms& atoms = d.connection.Atoms();
@@ -720,16 +547,8 @@ PlatformWindow X11Platform::CreateWindow(const WindowCreateParams& params) {
         record.frame = other.frame;
     }
   }
-  if (child) {
-    const PointT<std::int32_t> base = d.ClientOrigin(*parent);
-    record.client = {params.frame.left - base.x, params.frame.top - base.y, params.frame.width,
-                     params.frame.height};
-  } else {
-    const Insets& f = record.frame;
-    record.client = {params.frame.left + f.left, params.frame.top + f.top,
-                     std::max(0, params.frame.width - f.left - f.right),
-                     std::max(0, params.frame.height - f.top - f.bottom)};
-  }
+  record.client = child ? d.windows.InParentClient(params.parent, params.frame)
+                        : ClientWithin(params.frame, record.frame);
 
   XSetWindowAttributes attributes{};
   attributes.background_pixmap = None;
@@ -763,7 +582,7 @@ PlatformWindow X11Platform::CreateWindow(const WindowCreateParams& params) {
     hints.initial_state = NormalState;
     XSetWMHints(d.display, window, &hints);
     if (params.parent != kNoPlatformWindow) {
-      XSetTransientForHint(d.display, window, d.TopLevelOf(params.parent));
+      XSetTransientForHint(d.display, window, d.windows.TopLevelOf(params.parent));
     }
     const bool caption = HasCaption(params.style);
     long functions = kMotifFunctionMove;
@@ -809,18 +628,14 @@ PlatformWindow X11Platform::CreateWindow(const WindowCreateParams& params) {
     SetAtomProperty(d.display, window, atoms.netWmWindowType, XA_ATOM,
                     {static_cast<long>(atoms.netWmWindowTypePopupMenu)});
   }
-  d.windows.emplace(window, std::move(record));
-  WindowRecord& stored = *d.Find(window);
+  WindowRecord& stored = d.windows.Add(std::move(record));
   SetWindowTitle(window, params.title);
   if (managed) {
     // Size hints and placement: the client area goes where it was asked,
     // inside the frame the window manager announced.
-    const Insets& f = stored.frame;
-    SetClientRect(window, {params.frame.left + f.left, params.frame.top + f.top,
-                           std::max(0, params.frame.width - f.left - f.right),
-                           std::max(0, params.frame.height - f.top - f.bottom)});
+    SetClientRect(window, ClientWithin(params.frame, stored.frame));
   }
-  d.Invalidate(stored, nullptr);
+  AddPendingArea(stored, nullptr);
   if ((params.style & kStyleVisible) != 0) ShowWindow(window, true, false);
   XFlush(d.display);
   return window;
@@ -828,11 +643,11 @@ PlatformWindow X11Platform::CreateWindow(const WindowCreateParams& params) {
 
 void X11Platform::DestroyWindow(PlatformWindow window) {
   Impl& d = *impl_;
-  if (d.Find(window) == nullptr) return;
+  if (d.windows.Find(window) == nullptr) return;
   const bool wasActive = d.active == window;
-  const bool hadCapture = d.IsWithin(d.capture, window);
+  const bool hadCapture = d.windows.IsWithin(d.capture, window);
   std::function<void(PlatformWindow)> forget = [&](PlatformWindow handle) {
-    for (const PlatformWindow child : d.ChildrenOf(handle)) forget(child);
+    for (const PlatformWindow child : d.windows.ChildrenOf(handle)) forget(child);
     if (d.capture == handle) d.capture = kNoPlatformWindow;
     if (d.hover == handle) d.hover = kNoPlatformWindow;
     if (d.focus == handle) d.focus = kNoPlatformWindow;
@@ -842,7 +657,7 @@ void X11Platform::DestroyWindow(PlatformWindow window) {
                   [handle](const QueuedMessage& m) { return m.event.GetWindow() == handle; });
     std::erase(d.activationOrder, handle);
     d.timers.KillAll(handle);
-    d.windows.erase(handle);
+    d.windows.Erase(handle);
   };
   forget(window);
   if (hadCapture) XUngrabPointer(d.display, CurrentTime);
@@ -852,12 +667,12 @@ void X11Platform::DestroyWindow(PlatformWindow window) {
 }
 
 bool X11Platform::IsWindow(PlatformWindow window) const {
-  return impl_->Find(window) != nullptr;
+  return impl_->windows.Find(window) != nullptr;
 }
 
 void X11Platform::SetWindowTitle(PlatformWindow window, const velkcore::UTF16String& title) {
   Impl& d = *impl_;
-  WindowRecord* record = d.Find(window);
+  WindowRecord* record = d.windows.Find(window);
   if (record == nullptr) return;
   record->title = title;
   const std::string utf8 = velkcore::UTF16to8(title);
@@ -874,13 +689,13 @@ void X11Platform::SetWindowTitle(PlatformWindow window, const velkcore::UTF16Str
 }
 
 velkcore::UTF16String X11Platform::GetWindowTitle(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   return record != nullptr ? record->title : velkcore::UTF16String();
 }
 
 void X11Platform::ShowWindow(PlatformWindow window, bool show, bool activate) {
   Impl& d = *impl_;
-  WindowRecord* record = d.Find(window);
+  WindowRecord* record = d.windows.Find(window);
   if (record == nullptr) return;
   if (record->visible != show) {
     record->visible = show;
@@ -899,10 +714,10 @@ void X11Platform::ShowWindow(PlatformWindow window, bool show, bool activate) {
           XMapRaised(d.display, window);
         }
       }
-      d.Invalidate(*record, nullptr);
+      AddPendingArea(*record, nullptr);
     } else {
-      if (d.IsWithin(d.capture, window)) d.LoseCapture();
-      if (d.IsWithin(d.hover, window)) {
+      if (d.windows.IsWithin(d.capture, window)) d.LoseCapture();
+      if (d.windows.IsWithin(d.hover, window)) {
         d.PostLeaveIfTracked(d.hover);
         d.hover = kNoPlatformWindow;
       }
@@ -913,8 +728,8 @@ void X11Platform::ShowWindow(PlatformWindow window, bool show, bool activate) {
       }
       if (!record->child) {
         d.ActivateNextAfter(window);
-      } else if (d.IsWithin(d.focus, window)) {
-        d.SetFocus(d.TopLevelOf(window));
+      } else if (d.windows.IsWithin(d.focus, window)) {
+        d.SetFocus(d.windows.TopLevelOf(window));
       }
     }
   }
@@ -923,13 +738,13 @@ void X11Platform::ShowWindow(PlatformWindow window, bool show, bool activate) {
 }
 
 bool X11Platform::IsWindowVisible(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   return record != nullptr && record->visible;
 }
 
 void X11Platform::MinimizeWindow(PlatformWindow window, bool minimize) {
   Impl& d = *impl_;
-  WindowRecord* record = d.Find(window);
+  WindowRecord* record = d.windows.Find(window);
   if (record == nullptr || record->child || record->minimized == minimize) return;
   record->minimized = minimize;
   if (minimize) {
@@ -944,13 +759,13 @@ void X11Platform::MinimizeWindow(PlatformWindow window, bool minimize) {
     d.ActivateNextAfter(window);
   } else {
     if (record->visible) XMapRaised(d.display, window);
-    d.Invalidate(*record, nullptr);
+    AddPendingArea(*record, nullptr);
   }
   XFlush(d.display);
 }
 
 bool X11Platform::IsWindowMinimized(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   return record != nullptr && record->minimized;
 }
 
@@ -965,21 +780,21 @@ PlatformWindow X11Platform::GetActiveWindow() const {
 
 void X11Platform::EnableWindow(PlatformWindow window, bool enable) {
   Impl& d = *impl_;
-  WindowRecord* record = d.Find(window);
+  WindowRecord* record = d.windows.Find(window);
   if (record == nullptr) return;
   record->enabled = enable;
-  if (!enable && d.IsWithin(d.capture, window)) d.LoseCapture();
+  if (!enable && d.windows.IsWithin(d.capture, window)) d.LoseCapture();
 }
 
 bool X11Platform::IsWindowEnabled(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   return record != nullptr && record->enabled;
 }
 
 void X11Platform::SetWindowOpacity(PlatformWindow window, float opacity) {
   velkcore::RequireInput(std::isfinite(opacity));
   Impl& d = *impl_;
-  WindowRecord* record = d.Find(window);
+  WindowRecord* record = d.windows.Find(window);
   if (record == nullptr) return;
   record->opacity = std::clamp(opacity, 0.0f, 1.0f);
   // A compositing manager reads the property; X itself has no opacity.
@@ -997,7 +812,7 @@ void X11Platform::SetWindowOpacity(PlatformWindow window, float opacity) {
 void X11Platform::SetTransparentColorKey(PlatformWindow window,
                                          const std::optional<pictel::ColorRGBA>& key) {
   Impl& d = *impl_;
-  WindowRecord* record = d.Find(window);
+  WindowRecord* record = d.windows.Find(window);
   if (record == nullptr) return;
   record->colorKey = key;
   if (d.shapeAvailable && record->buffer) {
@@ -1008,9 +823,9 @@ void X11Platform::SetTransparentColorKey(PlatformWindow window,
 
 void X11Platform::SetWindowParent(PlatformWindow window, PlatformWindow parent) {
   Impl& d = *impl_;
-  WindowRecord* record = d.Find(window);
-  if (record == nullptr || !record->child || d.Find(parent) == nullptr) return;
-  velkcore::RequireInput(!d.IsWithin(parent, window));
+  WindowRecord* record = d.windows.Find(window);
+  if (record == nullptr || !record->child || d.windows.Find(parent) == nullptr) return;
+  velkcore::RequireInput(!d.windows.IsWithin(parent, window));
   record->parent = parent;
   XReparentWindow(d.display, window, parent, record->client.left, record->client.top);
   if (record->visible) XMapWindow(d.display, window);
@@ -1018,30 +833,24 @@ void X11Platform::SetWindowParent(PlatformWindow window, PlatformWindow parent) 
 }
 
 PlatformWindow X11Platform::GetWindowParent(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   return record != nullptr ? record->parent : kNoPlatformWindow;
 }
 
 // ---- Geometry ----
 
 RectT<std::int32_t> X11Platform::GetClientRect(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
-  return record != nullptr ? impl_->ScreenClient(*record) : RectT<std::int32_t>{};
+  const WindowRecord* record = impl_->windows.Find(window);
+  return record != nullptr ? impl_->windows.ScreenClient(*record) : RectT<std::int32_t>{};
 }
 
 void X11Platform::SetClientRect(PlatformWindow window, const RectT<std::int32_t>& rect) {
   velkcore::RequireInput(rect.width >= 0 && rect.height >= 0);
   Impl& d = *impl_;
-  WindowRecord* record = d.Find(window);
+  WindowRecord* record = d.windows.Find(window);
   if (record == nullptr) return;
-  RectT<std::int32_t> relative = rect;
-  if (record->child) {
-    const WindowRecord* parent = d.Find(record->parent);
-    const PointT<std::int32_t> base =
-        parent != nullptr ? d.ClientOrigin(*parent) : PointT<std::int32_t>{};
-    relative.left -= base.x;
-    relative.top -= base.y;
-  }
+  const RectT<std::int32_t> relative =
+      record->child ? d.windows.InParentClient(record->parent, rect) : rect;
   // Asking for the geometry the window has brings no answer to wait for.
   const bool unchanged = relative == record->client;
   d.ApplyClientRect(*record, relative);
@@ -1073,52 +882,43 @@ void X11Platform::SetClientRect(PlatformWindow window, const RectT<std::int32_t>
 }
 
 RectT<std::int32_t> X11Platform::GetFrameRect(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   return record != nullptr ? impl_->ScreenFrame(*record) : RectT<std::int32_t>{};
 }
 
 void X11Platform::SetFrameRect(PlatformWindow window, const RectT<std::int32_t>& rect) {
-  const WindowRecord* record = impl_->Find(window);
+  const WindowRecord* record = impl_->windows.Find(window);
   if (record == nullptr) return;
-  const Insets& f = record->frame;
-  SetClientRect(window,
-                {rect.left + f.left, rect.top + f.top, std::max(0, rect.width - f.left - f.right),
-                 std::max(0, rect.height - f.top - f.bottom)});
+  SetClientRect(window, ClientWithin(rect, record->frame));
 }
 
 // ---- Painting ----
 
 void X11Platform::InvalidateRect(PlatformWindow window, const RectT<std::int32_t>* clientRect) {
-  if (WindowRecord* record = impl_->Find(window)) impl_->Invalidate(*record, clientRect);
+  if (WindowRecord* record = impl_->windows.Find(window)) AddPendingArea(*record, clientRect);
 }
 
 bool X11Platform::HasPendingPaint(PlatformWindow window) const {
-  const WindowRecord* record = impl_->Find(window);
-  return record != nullptr && impl_->IsPaintable(*record);
+  const WindowRecord* record = impl_->windows.Find(window);
+  return record != nullptr && impl_->windows.IsPaintable(*record);
 }
 
 std::optional<PaintTarget> X11Platform::BeginPaint(PlatformWindow window) {
   Impl& d = *impl_;
-  WindowRecord* record = d.Find(window);
-  if (record == nullptr || !d.IsPaintable(*record)) return std::nullopt;
-  PaintTarget target;
-  target.context = record->buffer->Image();
-  target.rects = std::move(record->pending);
-  record->pending.clear();
-  for (const RectT<std::int32_t>& r : target.rects)
-    target.bounds = velkcore::Union(target.bounds, r);
-  ++record->paintCount;
-  return target;
+  WindowRecord* record = d.windows.Find(window);
+  if (record == nullptr || !d.windows.IsPaintable(*record)) return std::nullopt;
+  return platform::TakePendingPaint(*record, record->buffer->Image());
 }
 
 void X11Platform::EndPaint(PlatformWindow window, const PaintTarget& target) {
   Impl& d = *impl_;
-  WindowRecord* record = d.Find(window);
+  WindowRecord* record = d.windows.Find(window);
   if (record == nullptr || !record->buffer) return;
   record->buffer->Present(target.rects);
   const RectT<std::int32_t> whole{0, 0, record->client.width, record->client.height};
-  if (std::any_of(target.rects.begin(), target.rects.end(),
-                  [&whole](const RectT<std::int32_t>& r) { return Contains(r, whole); })) {
+  if (std::any_of(target.rects.begin(), target.rects.end(), [&whole](const RectT<std::int32_t>& r) {
+        return platform::Contains(r, whole);
+      })) {
     record->buffer->MarkComplete();
   }
   // Pop-ups without a frame show their transparent corners as holes.
@@ -1132,7 +932,7 @@ void X11Platform::EndPaint(PlatformWindow window, const PaintTarget& target) {
 
 void X11Platform::SetCapture(PlatformWindow window) {
   Impl& d = *impl_;
-  if (d.Find(window) == nullptr || d.capture == window) return;
+  if (d.windows.Find(window) == nullptr || d.capture == window) return;
   if (d.capture != kNoPlatformWindow) d.Post(d.capture, kMsgCaptureLost);
   d.capture = window;
   XGrabPointer(d.display, window, False, kGrabEvents, GrabModeAsync, GrabModeAsync, None,
@@ -1158,7 +958,7 @@ PlatformWindow X11Platform::GetCapture() const {
 }
 
 void X11Platform::SetFocus(PlatformWindow window) {
-  if (window != kNoPlatformWindow && impl_->Find(window) == nullptr) return;
+  if (window != kNoPlatformWindow && impl_->windows.Find(window) == nullptr) return;
   impl_->SetFocus(window);
 }
 
@@ -1175,7 +975,7 @@ PlatformWindow X11Platform::GetWindowFromPoint(const PointT<std::int32_t>& scree
 }
 
 void X11Platform::TrackPointerLeave(PlatformWindow window) {
-  if (WindowRecord* record = impl_->Find(window)) record->trackLeave = true;
+  if (WindowRecord* record = impl_->windows.Find(window)) record->trackLeave = true;
 }
 
 bool X11Platform::HasPendingPointerMove(PlatformWindow window) const {
@@ -1237,7 +1037,7 @@ double X11Platform::GetTime() const {
 }
 
 void X11Platform::SetTimer(PlatformWindow window, std::uint32_t id, std::uint32_t milliseconds) {
-  if (impl_->Find(window) == nullptr) return;
+  if (impl_->windows.Find(window) == nullptr) return;
   impl_->timers.Set(window, id, milliseconds, impl_->Now());
 }
 
@@ -1280,7 +1080,7 @@ bool X11Platform::GetNextEvent(OS_Event& event, bool wait) {
       return true;
     }
     for (const auto& [handle, record] : d.windows) {
-      if (d.IsPaintable(record)) {
+      if (d.windows.IsPaintable(record)) {
         event = OS_Event(handle, kMsgPaint, 0, 0, d.Now());
         return true;
       }

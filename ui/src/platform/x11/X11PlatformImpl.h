@@ -16,6 +16,8 @@
 #include <velkui/ui/OS_Event.h>
 #include <velkui/ui/PlatformTypes.h>
 
+#include "../common/KeyTable.h"
+#include "../common/WindowTable.h"
 #include "TimerHeap.h"
 #include "X11BackBuffer.h"
 #include "X11Clipboard.h"
@@ -29,12 +31,7 @@ namespace velkui::ui::x11 {
 using velkcore::PointT;
 using velkcore::RectT;
 
-struct Insets {
-  std::int32_t left = 0;
-  std::int32_t right = 0;
-  std::int32_t top = 0;
-  std::int32_t bottom = 0;
-};
+using platform::Insets;
 
 struct InputContextDeleter {
   void operator()(XIC context) const {
@@ -43,35 +40,17 @@ struct InputContextDeleter {
 };
 using InputContext = std::unique_ptr<std::remove_pointer_t<XIC>, InputContextDeleter>;
 
-struct WindowRecord {
-  PlatformWindow handle = kNoPlatformWindow;
-  // The parent of a child window, the owner of any other.
-  PlatformWindow parent = kNoPlatformWindow;
-  bool child = false;
+struct WindowRecord : platform::WindowRecordBase {
   // A pop-up without caption: placed by us, never by a window manager.
   bool overrideRedirect = false;
-  velkcore::UTF16String title;
-  // Screen coordinates for top-level windows; relative to the parent's client
-  // origin for child windows.
-  RectT<std::int32_t> client;
   // The window manager's frame around the client area.
   Insets frame;
-  std::uint32_t style = 0;
-  std::uint32_t exStyle = 0;
-  bool visible = false;
-  bool enabled = true;
-  bool minimized = false;
   // Whether a window manager put the window into a frame of its own.
   bool reparented = false;
-  float opacity = 1.0f;
-  std::optional<pictel::ColorRGBA> colorKey;
   std::unique_ptr<X11BackBuffer> buffer;
-  std::vector<RectT<std::int32_t>> pending;
-  bool trackLeave = false;
   InputContext inputContext;
   // Client rectangles asked of the server whose ConfigureNotify has not come back.
   std::deque<RectT<std::int32_t>> configureRequests;
-  std::int32_t paintCount = 0;
 };
 
 // One message of the queue, with what the backend needs to know when it is taken.
@@ -111,7 +90,7 @@ struct X11Platform::Impl {
   x11::X11Keyboard keyboard;
   x11::X11Cursors cursors;
   x11::X11Clipboard clipboard;
-  std::map<PlatformWindow, x11::WindowRecord> windows;
+  platform::WindowTable<x11::WindowRecord> windows;
 
   // Top-level windows in the order they were last activated (latest last).
   std::vector<PlatformWindow> activationOrder;
@@ -128,7 +107,7 @@ struct X11Platform::Impl {
   bool focusCheckPending = false;
   // What GetKeyState answers (as of the messages taken) and which keycodes
   // the X server reported down.
-  std::array<KeyState, 256> keys{};
+  platform::KeyTable keys{};
   std::array<bool, 256> keycodeDown{};
   struct Press {
     PlatformWindow window = kNoPlatformWindow;
@@ -152,17 +131,7 @@ struct X11Platform::Impl {
   std::array<std::int32_t, 2> wheelRemainder{};
 
   // ---- Records ----
-  x11::WindowRecord* Find(PlatformWindow handle);
-  const x11::WindowRecord* Find(PlatformWindow handle) const;
-  PointT<std::int32_t> ClientOrigin(const x11::WindowRecord& record) const;
-  RectT<std::int32_t> ScreenClient(const x11::WindowRecord& record) const;
   RectT<std::int32_t> ScreenFrame(const x11::WindowRecord& record) const;
-  bool IsShownOnScreen(const x11::WindowRecord& record) const;
-  bool IsEnabledForInput(PlatformWindow handle) const;
-  PlatformWindow TopLevelOf(PlatformWindow handle) const;
-  bool IsWithin(PlatformWindow handle, PlatformWindow ancestor) const;
-  std::vector<PlatformWindow> ChildrenOf(PlatformWindow handle) const;
-  std::vector<PlatformWindow> TopLevels() const;
 
   // ---- Queue ----
   double Now() const;
@@ -172,8 +141,6 @@ struct X11Platform::Impl {
   // `locks`: the lock keys too (not for a lock key's own messages, whose
   // state may still show the lock it is about to change).
   void SyncModifiers(unsigned state, bool locks);
-  bool IsPaintable(const x11::WindowRecord& record) const;
-  void Invalidate(x11::WindowRecord& record, const RectT<std::int32_t>* rect);
   void ApplyClientRect(x11::WindowRecord& record, const RectT<std::int32_t>& relative);
   // Whether GetNextEvent would hand something out now.
   bool HasMessage();
