@@ -228,7 +228,6 @@ TEST_F(DialogModalTest, FrameStylesFollowTheKindAndTheCloseBoxSetting) {
   EXPECT_EQ(styleOf(params), std::make_pair(kStylePopup | kStyleCaption, 0u));
   // The platform sees the dialog as owned by its parent's window.
   auto dialog = MakeDialog(main.get());
-  EXPECT_EQ(dialog->UI_GetNodeID(), "UI_Dialog");
   EXPECT_EQ(dialog->GetOwner(), main.get());
 }
 

@@ -365,15 +365,5 @@ TEST_F(HeadlessPlatformTest, QuitComesOnceTheQueueIsEmpty) {
   EXPECT_FALSE(platform.GetNextEvent(event, true));
 }
 
-TEST_F(HeadlessPlatformTest, TheClipboardKeepsEveryRepresentation) {
-  EXPECT_FALSE(platform.GetClipboard("VELKUI/UnicodeText").has_value());
-  platform.SetClipboard({{"VELKUI/UnicodeText", "h\0i"}, {"VELKUI/FileDrop", "/tmp/a"}});
-  EXPECT_EQ(platform.GetClipboardTypes(),
-            (std::vector<std::string>{"VELKUI/UnicodeText", "VELKUI/FileDrop"}));
-  EXPECT_EQ(platform.GetClipboard("VELKUI/FileDrop"), "/tmp/a");
-  platform.SetClipboard({});
-  EXPECT_TRUE(platform.GetClipboardTypes().empty());
-}
-
 }  // namespace
 }  // namespace velkui::ui::test

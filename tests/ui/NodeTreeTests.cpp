@@ -143,7 +143,6 @@ TEST_F(NodeTreeTest, ChildLookupByIdMatchesDirectChildrenOnly) {
   EXPECT_EQ(root->UI_ChildGetFromID("x"), a.get());
   EXPECT_EQ(root->UI_ChildGetFromID("deep"), nullptr);
   EXPECT_EQ(root->UI_ChildFindFromID("X"), root->ChildEnd());
-  EXPECT_EQ(velkcore::MakeIntrusive<UI_SubView>()->UI_GetNodeID(), "UI_SubView");
 }
 
 TEST_F(NodeTreeTest, ANewSubViewNeedsBothShowingAndAPositiveSize) {

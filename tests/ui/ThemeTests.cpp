@@ -34,10 +34,6 @@ void ExpectContractViolation(const std::function<void()>& action) {
   EXPECT_EQ(error->GetNumber(), velkcore::kInputContractViolationNumber);
 }
 
-ColorRGBA Bytes(int r, int g, int b, float a = 1) {
-  return {r / 255.0f, g / 255.0f, b / 255.0f, a};
-}
-
 // Tests of the singleton leave no theme installed behind them.
 class InstalledThemeTest : public ::testing::Test {
  protected:
@@ -53,15 +49,6 @@ TEST(ThemePaletteTest, FreshThemeHoldsTheWholePaletteWithItsFixedRows) {
   EXPECT_FALSE(theme.HasColor(kThemePaletteSize));
   ExpectContractViolation([&] { theme.GetColor(kThemePaletteSize); });
   ExpectContractViolation([] { GetDefaultThemeColor(kThemePaletteSize); });
-
-  EXPECT_EQ(theme.GetColor(0), (ColorRGBA{1, 1, 1, 0.75f}));
-  EXPECT_EQ(theme.GetColor(1), Bytes(38, 38, 38));
-  EXPECT_EQ(theme.GetColor(2), (ColorRGBA{1, 1, 1, 1}));
-  EXPECT_EQ(theme.GetColor(3), Bytes(199, 199, 199));
-  EXPECT_EQ(theme.GetColor(4), Bytes(247, 247, 247));
-  EXPECT_EQ(theme.GetColor(6), Bytes(224, 224, 224));
-  EXPECT_EQ(theme.GetColor(15), Bytes(223, 223, 223, 0.5f));
-  EXPECT_EQ(theme.GetColor(18), Bytes(83, 182, 249));
 }
 
 TEST(ThemeColorTest, BrightnessRebuildsThePaletteButKeepsOtherIndices) {

@@ -130,7 +130,6 @@ TEST_F(WindowPaintTest, APopupDrawsWithItsOwnSupplier) {
   auto popup = velkcore::MakeIntrusive<OS_PopupWindow>();
   popup->UI_CreatePopupWindow({400, 400, 60, 20});
   EXPECT_NE(popup->UI_GetDrawSupplier(), window->UI_GetDrawSupplier());
-  EXPECT_EQ(popup->UI_GetNodeID(), "OS_PopupWindow");
   popup->UI_Show(true);
   headless.ProcessEvents();
   EXPECT_EQ(headless.GetPaintCount(Handle(*popup)), 1);

@@ -22,7 +22,6 @@ TEST_F(WindowLifecycleTest, ATopLevelWindowsCoordinatesAreItsClientAreaOnScreen)
   EXPECT_EQ(window->UI_GetLocalRect(true), (RectT<std::int32_t>{101, 75, 298, 174}));
   EXPECT_EQ(window->UI_GetLocalRectF(false), (RectT<float>{0, 0, 298, 174}));
   EXPECT_EQ(window->UI_GetSelfToParentMatrix(), (ScaleMatrixT<float>{101, 75, 1, 1}));
-  EXPECT_EQ(window->UI_GetNodeID(), "OS_Window");
   EXPECT_FALSE(window->UI_IsShown());
   EXPECT_TRUE(window->UI_ReceivesEventsFromOS());
   auto view = View(window.get(), {10, 20, 30, 30}, "view");
@@ -224,13 +223,11 @@ TEST_F(WindowLifecycleTest, AViewContainerFollowsItsNodeInsideTheHost) {
   auto window = MakeWindow({100, 100, 400, 300});
   auto panel = View(window.get(), {50, 40, 300, 200}, "panel");
   auto container = velkcore::MakeIntrusive<OS_ViewContainer>(true);
-  EXPECT_TRUE(container->UI_GetDoubleBuffered());
   container->UI_SetLocalRectF({10, 10, 100, 50});
   container->UI_Show(true);
   panel->ChildPushBack(container);
   const PlatformWindow handle = Handle(*container);
   ASSERT_NE(handle, kNoPlatformWindow);
-  EXPECT_EQ(container->UI_GetNodeID(), "OS_ViewContainer");
   EXPECT_EQ(headless.GetClientRect(handle), (RectT<std::int32_t>{160, 150, 100, 50}));
   panel->UI_SetLocalRectF({60, 40, 300, 200});
   EXPECT_EQ(headless.GetClientRect(handle), (RectT<std::int32_t>{170, 150, 100, 50}));
