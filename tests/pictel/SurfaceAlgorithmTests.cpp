@@ -265,9 +265,6 @@ TEST_F(RecordingTest, ForwardingSurfaceSendsEverythingToItsTarget) {
   {
     boost::intrusive_ptr<BasicSurfaceReferenceInterface> reference(
         new BasicSurfaceReferenceInterface(ownSupplier.get(), surface.Get(), true, &bounds));
-    EXPECT_EQ(ownSupplier.get(), reference->GetSupplier());
-    EXPECT_EQ(supplier.get(), reference->GetOutputSupplier());
-    EXPECT_EQ(surface.Get(), reference->GetOutputSurface());
     reference->ClipToReferenceSurface(supplier.get());
     EXPECT_EQ(bounds, surface->GetClipBounds());
     reference->Transform(MatrixT<float>::Translation(3, 4));
