@@ -210,16 +210,12 @@ TEST(PropListXML, ListsNestUpToTheLimit) {
   EXPECT_EQ(RoundTrip(deepest), deepest);
   EXPECT_EQ(ReadPropList(Nested(kMaxPropListDepth)), deepest);
 
-  const auto readError = ErrorOf([] { ReadPropList(Nested(kMaxPropListDepth + 1)); });
-  ASSERT_TRUE(readError);
-  EXPECT_EQ(readError->GetKey(), kPropListTooDeepKey);
   const std::size_t column = Nested(kMaxPropListDepth + 1).find("<prop.list/>") + 1;
-  EXPECT_EQ(readError->what(),
-            "Lists nest deeper than 256 levels at line 1, column " + std::to_string(column) + ".");
-
-  const auto writeError = ErrorOf([] { WritePropList(NestedList(kMaxPropListDepth + 1)); });
-  ASSERT_TRUE(writeError);
-  EXPECT_EQ(writeError->GetKey(), kPropListWriteTooDeepKey);
+  EXPECT_TRUE(Raises(
+      [] { ReadPropList(Nested(kMaxPropListDepth + 1)); }, kPropListTooDeepKey,
+      "Lists nest deeper than 256 levels at line 1, column " + std::to_string(column) + ".", true));
+  EXPECT_TRUE(
+      Raises([] { WritePropList(NestedList(kMaxPropListDepth + 1)); }, kPropListWriteTooDeepKey));
 }
 
 TEST(PropListXML, AcceptsEquivalentSpellings) {
