@@ -9,6 +9,7 @@
 #include <limits>
 #include <optional>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include <gtest/gtest.h>
@@ -44,16 +45,7 @@ PropList NestedList(std::size_t lists) {
 
 TEST(PropListXML, WritesTheStoredForm) {
   PropList list;
-  list.Set("visible", true);
-  list.Set("off", false);
   list.Set("count", -2);
-  list.Set("size", 7u);
-  list.Set("port", std::uint16_t{8080});
-  list.Set("ratio", 0.1f);
-  list.Set("precise", 0.1);
-  list.Set("name", "A&B <c>");
-  list.Set("title", u"Zoom\r\n");
-  list.Set("raw", std::string("\x01", 1));
   list.Set("items", UTF16StringArray{u"one", u"two"});
   list.NewSubList("empty");
   list.NewSubList("bounds")->Set("left", 1);
@@ -86,43 +78,6 @@ TEST(PropListXML, WritesTheStoredForm) {
         <ustring>two</ustring>
       </array>
     </prop.pair>
-    <prop.pair>
-      <key>name</key>
-      <string>A&amp;B &lt;c&gt;</string>
-    </prop.pair>
-    <prop.pair>
-      <key>off</key>
-      <false/>
-    </prop.pair>
-    <prop.pair>
-      <key>port</key>
-      <int type="unsigned" size="16">8080</int>
-    </prop.pair>
-    <prop.pair>
-      <key>precise</key>
-      <float size="64">0.1</float>
-    </prop.pair>
-    <prop.pair>
-      <key>ratio</key>
-      <float>0.1</float>
-    </prop.pair>
-    <prop.pair>
-      <key>raw</key>
-      <string encoding="hex">01</string>
-    </prop.pair>
-    <prop.pair>
-      <key>size</key>
-      <int type="unsigned" size="32">7</int>
-    </prop.pair>
-    <prop.pair>
-      <key>title</key>
-      <ustring>Zoom&#13;
-</ustring>
-    </prop.pair>
-    <prop.pair>
-      <key>visible</key>
-      <true/>
-    </prop.pair>
   </prop.list>
 </prop.map>
 )");
@@ -130,6 +85,31 @@ TEST(PropListXML, WritesTheStoredForm) {
   EXPECT_EQ(WritePropList(PropList()),
             "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<prop.map version=\"4\">\n"
             "  <prop.list/>\n</prop.map>\n");
+}
+
+// The element each kind of value is stored as, alone in a list under the key "k".
+TEST(PropListXML, WritesEachValueAsItsElement) {
+  const std::pair<std::function<void(PropList&)>, std::string> cases[] = {
+      {[](PropList& l) { l.Set("k", true); }, "<true/>"},
+      {[](PropList& l) { l.Set("k", false); }, "<false/>"},
+      {[](PropList& l) { l.Set("k", 7u); }, R"(<int type="unsigned" size="32">7</int>)"},
+      {[](PropList& l) { l.Set("k", std::uint16_t{8080}); },
+       R"(<int type="unsigned" size="16">8080</int>)"},
+      {[](PropList& l) { l.Set("k", 0.1f); }, "<float>0.1</float>"},
+      {[](PropList& l) { l.Set("k", 0.1); }, R"(<float size="64">0.1</float>)"},
+      {[](PropList& l) { l.Set("k", "A&B <c>"); }, "<string>A&amp;B &lt;c&gt;</string>"},
+      {[](PropList& l) { l.Set("k", u"Zoom\r\n"); }, "<ustring>Zoom&#13;\n</ustring>"},
+      {[](PropList& l) { l.Set("k", std::string("\x01", 1)); },
+       R"(<string encoding="hex">01</string>)"},
+  };
+  const std::string head = "    <prop.pair>\n      <key>k</key>\n      ";
+  for (const auto& [set, element] : cases) {
+    PropList list;
+    set(list);
+    const std::string xml = WritePropList(list);
+    EXPECT_NE(xml.find(head + element + "\n    </prop.pair>"), std::string::npos) << xml;
+    EXPECT_EQ(RoundTrip(list), list) << element;
+  }
 }
 
 TEST(PropListXML, ExtremeNumbersReadBackBitExactly) {
