@@ -88,8 +88,7 @@ TEST_F(CairoTest, OneUnitStrokeCoversExactlyItsPixelRow) {
   for (auto policy : {AntiAliasPolicy::kOff, AntiAliasPolicy::kOn}) {
     SurfaceP target(*supplier, 40, 30, true);
     target->SetAntiAliasPolicy(policy);
-    auto line = Line({5, 10}, {25, 10});
-    target->StrokePath(*pen, *line);
+    target->StrokePath(*pen, *Line({5, 10}, {25, 10}));
     PixelProbe probe(*target);
     EXPECT_EQ(20, probe.Count(kBlack, 5, 10, 20, 1)) << static_cast<int>(policy);
     EXPECT_EQ(20, probe.CountVisible()) << static_cast<int>(policy);
@@ -98,8 +97,7 @@ TEST_F(CairoTest, OneUnitStrokeCoversExactlyItsPixelRow) {
 
 TEST_F(CairoTest, WholeNumberedOutlinesAreCrisp) {
   PenP pen(*supplier, {0, 0, 0, 1}, 1.0f);
-  auto box = RectPath(RectT<std::int32_t>{5, 5, 10, 10});
-  surface->StrokePath(*pen, *box);
+  surface->StrokePath(*pen, *RectPath(RectT<std::int32_t>{5, 5, 10, 10}));
   // The outline of a 10-unit square fills the 11 × 11 pixel ring from 5 to 15.
   const PixelProbe probe = Probe();
   EXPECT_EQ(40, probe.Count(kBlack, 0, 0, 40, 30));
@@ -108,8 +106,7 @@ TEST_F(CairoTest, WholeNumberedOutlinesAreCrisp) {
   // A two-unit line needs no shift: it covers the rows on both sides of y.
   SurfaceP wide(*supplier, 40, 30, true);
   PenP widePen(*supplier, {0, 0, 0, 1}, 2.0f);
-  auto line = Line({0, 10}, {40, 10});
-  wide->StrokePath(*widePen, *line);
+  wide->StrokePath(*widePen, *Line({0, 10}, {40, 10}));
   PixelProbe wideProbe(*wide);
   EXPECT_EQ(80, wideProbe.Count(kBlack, 0, 9, 40, 2));
   EXPECT_EQ(80, wideProbe.CountVisible());
@@ -119,8 +116,7 @@ TEST_F(CairoTest, DashesCapsAndJoinsReachThePixels) {
   PenP pen(*supplier, {0, 0, 0, 1}, 1.0f);
   const float dashes[2] = {2, 3};
   pen->SetDashArray(dashes, 2);
-  auto line = Line({0, 3}, {20, 3});
-  surface->StrokePath(*pen, *line);
+  surface->StrokePath(*pen, *Line({0, 3}, {20, 3}));
   const PixelProbe probe = Probe();
   for (int x = 0; x < 20; ++x) {
     EXPECT_EQ(x % 5 < 2 ? 255 : 0, probe.At(x, 3).alpha) << x;
@@ -128,8 +124,7 @@ TEST_F(CairoTest, DashesCapsAndJoinsReachThePixels) {
   // A square cap reaches half the width beyond the end; a flat one does not.
   PenP thick(*supplier, {0, 0, 0, 1}, 4.0f);
   thick->SetLineCap(LineCapType::kSquare);
-  auto stub = Line({10, 20}, {20, 20});
-  surface->StrokePath(*thick, *stub);
+  surface->StrokePath(*thick, *Line({10, 20}, {20, 20}));
   EXPECT_EQ(255, Probe().At(8, 20).alpha);
   EXPECT_EQ(255, Probe().At(21, 20).alpha);
   EXPECT_EQ(0, Probe().At(7, 20).alpha);
@@ -178,8 +173,7 @@ TEST_F(CairoTest, PopRestoresPoliciesTransformAndClipButNeverTheBottom) {
   surface->SetInterpolationPolicy(InterpolationPolicy::kNearestNeighbor);
   surface->SetTextDisplayPolicy(TextDisplayPolicy::kGridFitted);
   surface->Transform(MatrixT<float>::Translation(10, 0));
-  auto clip = RectPath(RectT<float>{0, 0, 5, 5});
-  surface->Clip(*clip, FillType::kWinding);
+  surface->Clip(*RectPath(RectT<float>{0, 0, 5, 5}), FillType::kWinding);
   EXPECT_EQ((RectT<std::int32_t>{0, 0, 5, 5}), surface->GetClipBounds());
   surface->PopStateStack();
   surface->PopStateStack();
@@ -295,12 +289,10 @@ TEST_F(CairoTest, GradientsAreShadersAndBrushes) {
   const ColorRGBA colours[2] = {{1, 0, 0, 1}, {0, 0, 1, 1}};
   const float positions[2] = {0, 1};
   auto shader = supplier->CreateLinearShader({0, 0}, {40, 0}, colours, positions, 2);
-  auto path = RectPath(RectT<float>{0, 0, 40, 10});
-  surface->ShadePath(*shader, *path, FillType::kWinding);
+  surface->ShadePath(*shader, *RectPath(RectT<float>{0, 0, 40, 10}), FillType::kWinding);
   const BrushInterface* asBrush = AsBrush(*shader);
   ASSERT_NE(nullptr, asBrush);
-  auto lower = RectPath(RectT<float>{0, 20, 40, 10});
-  surface->FillPath(*asBrush, *lower, FillType::kWinding);
+  surface->FillPath(*asBrush, *RectPath(RectT<float>{0, 20, 40, 10}), FillType::kWinding);
   const PixelProbe probe = Probe();
   EXPECT_GT(probe.At(0, 5).red, 240);
   EXPECT_GT(probe.At(39, 5).blue, 240);
@@ -309,8 +301,7 @@ TEST_F(CairoTest, GradientsAreShadersAndBrushes) {
 
   auto radial = supplier->CreateRadialShader({20, 15}, 10, colours, positions, 2);
   SurfaceP disc(*supplier, 40, 30, true);
-  auto all = RectPath(RectT<float>{0, 0, 40, 30});
-  disc->ShadePath(*radial, *all, FillType::kWinding);
+  disc->ShadePath(*radial, *RectPath(RectT<float>{0, 0, 40, 30}), FillType::kWinding);
   PixelProbe discProbe(*disc);
   EXPECT_GT(discProbe.At(20, 15).red, 230);
   EXPECT_GT(discProbe.At(0, 0).blue, 240);
