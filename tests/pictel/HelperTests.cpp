@@ -24,13 +24,10 @@ using velkui::test::RecordingSupplier;
 using velkui::test::RecordingSurface;
 using Strings = std::vector<std::string>;
 
-class HelperTest : public ::testing::Test {
+class HelperTest : public test::RecordingSurfaceTest {
  protected:
-  boost::intrusive_ptr<RecordingSupplier> supplier{new RecordingSupplier()};
-  SurfaceP surface{*supplier, 200, 100};
   Pictel pictel{supplier.get(), surface.Get()};
 
-  Strings Drawn() const { return supplier->GetLog().Strings(0, true); }
   static std::string Describe(const PathP& path) {
     return dynamic_cast<const RecordingPath&>(*path).Describe();
   }
@@ -61,7 +58,6 @@ TEST_F(HelperTest, GradientFallsBackToOneColourAtTheInterfaceBrightness) {
 }
 
 TEST_F(HelperTest, FontBaselineCentresTheTextAndRoundsHalvesAway) {
-  const FontP font(*supplier, u"Fixed", u"", 10.0f);  // ascent 8, descent 2
   EXPECT_EQ(23.0f, velkui::GetFontBaseline(font, {0, 10, 50, 20}));
   EXPECT_EQ(19.0f, velkui::GetFontBaseline(font, {0, 10, 50, 11}));
   EXPECT_EQ(-22.0f, velkui::GetFontBaseline(font, {0, -30, 50, 11}));

@@ -3,10 +3,13 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 #include <gtest/gtest.h>
 
 #include <velkcore/Error.h>
+#include <velkui/pictel/PictelHandles.h>
+#include <velkui/test/RecordingSupplier.h>
 
 namespace velkui::pictel::test {
 
@@ -41,5 +44,19 @@ template <typename Action>
   }
   return ::testing::AssertionSuccess();
 }
+
+// A recording supplier with a logged surface of 200 × 100 pixels, a font whose characters are
+// 5 units wide (ascent 8, descent 2) and a black brush.
+class RecordingSurfaceTest : public ::testing::Test {
+ protected:
+  boost::intrusive_ptr<velkui::test::RecordingSupplier> supplier{
+      new velkui::test::RecordingSupplier()};
+  SurfaceP surface{*supplier, 200, 100};
+  FontP font{*supplier, u"Fixed", u"", 10.0f};
+  BrushP brush{*supplier, {0, 0, 0, 1}};
+
+  // The drawing calls of every surface.
+  std::vector<std::string> Drawn() const { return supplier->GetLog().Strings(0, true); }
+};
 
 }  // namespace velkui::pictel::test

@@ -22,13 +22,9 @@ using velkui::test::RecordingSupplier;
 using velkui::test::RecordingSurface;
 using Strings = std::vector<std::string>;
 
-// A surface of 200 × 100 pixels whose calls are logged; the font is 5 units per character.
-class RecordingTest : public ::testing::Test {
+// Reads the calls of its own surface alone.
+class RecordingTest : public test::RecordingSurfaceTest {
  protected:
-  boost::intrusive_ptr<RecordingSupplier> supplier{new RecordingSupplier()};
-  SurfaceP surface{*supplier, 200, 100};
-  FontP font{*supplier, u"Fixed", u"", 10.0f};
-  BrushP brush{*supplier, {0, 0, 0, 1}};
   PenP pen{*supplier, {0, 0, 1, 1}, 1.0f};
 
   int Id() const { return static_cast<RecordingSurface*>(surface.Get())->GetId(); }

@@ -8,6 +8,8 @@
 #include <velkui/test/FixedMetricsFont.h>
 #include <velkui/test/RecordingSupplier.h>
 
+#include "PictelTestSupport.h"
+
 namespace {
 
 using namespace velkui::pictel;
@@ -88,15 +90,7 @@ TEST_F(TruncationTest, CutAtEndNeverSplitsASurrogatePair) {
   EXPECT_EQ(u"ab...", TruncateString(font, u"ab\U0001F600cd", TextTruncation::kEndEllipsis, 29.0f));
 }
 
-class DrawStringTest : public ::testing::Test {
- protected:
-  boost::intrusive_ptr<RecordingSupplier> supplier{new RecordingSupplier()};
-  SurfaceP surface{*supplier, 200, 100};
-  FontP font{*supplier, u"Fixed", u"", 10.0f};
-  BrushP brush{*supplier, {0, 0, 0, 1}};
-
-  std::vector<std::string> Drawn() const { return supplier->GetLog().Strings(0, true); }
-};
+using DrawStringTest = velkui::pictel::test::RecordingSurfaceTest;
 
 TEST_F(DrawStringTest, TruncatedTextIsDrawnAtTheSamePointAndAlignment) {
   surface->DrawString(*brush, *font, u"abcdefghij", {100, 50}, TextAlignment::kEnd,
