@@ -17,13 +17,20 @@ class AutoLayoutTest : public ::testing::Test {
   AutoLayoutTest()
       : surface_(supplier_->NewSurface(1, 1, true)), context_(supplier_.get(), surface_.get()) {}
 
+  // A layout view with layout enabled.
+  static boost::intrusive_ptr<UI_LayoutView> MakeView(const RectT<float>& frame,
+                                                      bool maintainMargins) {
+    auto view = velkcore::MakeIntrusive<UI_LayoutView>();
+    view->UI_SetLocalRectF(frame);
+    view->SetLayoutEnabled(true);
+    view->SetMaintainMargins(maintainMargins);
+    return view;
+  }
+
   // A horizontal view 200 × 50 with three 40 × 20 children 10 apart.
   boost::intrusive_ptr<UI_LayoutView> MakeRow(bool maintainMargins) {
-    auto view = velkcore::MakeIntrusive<UI_LayoutView>();
-    view->UI_SetLocalRectF({5, 5, 200, 50});
-    view->SetLayoutEnabled(true);
+    auto view = MakeView({5, 5, 200, 50}, maintainMargins);
     view->SetLayoutMode(UI_LayoutView::kLayoutHorizontal);
-    view->SetMaintainMargins(maintainMargins);
     first = AddFixed(view.get(), {10, 10, 40, 20});
     second = AddFixed(view.get(), {60, 10, 40, 20}, {60, 20});
     third = AddFixed(view.get(), {110, 10, 40, 20});
@@ -63,9 +70,7 @@ TEST_F(AutoLayoutTest, GrowthMovesTheFollowingChildrenAndSizesTheView) {
 }
 
 TEST_F(AutoLayoutTest, ChildrenAreTakenInOrderOfTheirEdgeAndOriginsAreWholeNumbers) {
-  auto view = velkcore::MakeIntrusive<UI_LayoutView>();
-  view->UI_SetLocalRectF({0, 0, 100, 300});
-  view->SetLayoutEnabled(true);
+  auto view = MakeView({0, 0, 100, 300}, false);
   view->SetLayoutMode(7);  // vertical
   EXPECT_EQ(view->GetLayoutMode(), UI_LayoutView::kLayoutVertical);
   // Added bottom first; the upper one grows by 10.5 (rounded up to 11).
@@ -90,23 +95,14 @@ TEST_F(AutoLayoutTest, ScaledChildrenShareTheLargestSizeAcross) {
 }
 
 TEST_F(AutoLayoutTest, NestedViewsAreLaidOutFirst) {
-  auto outer = velkcore::MakeIntrusive<UI_LayoutView>();
-  outer->UI_SetLocalRectF({0, 0, 300, 100});
-  outer->SetLayoutEnabled(true);
-  outer->SetMaintainMargins(true);
-  auto inner = velkcore::MakeIntrusive<UI_LayoutView>();
-  inner->UI_SetLocalRectF({0, 0, 100, 40});
-  inner->SetLayoutEnabled(true);
-  inner->SetMaintainMargins(true);
+  auto outer = MakeView({0, 0, 300, 100}, true);
+  auto inner = MakeView({0, 0, 100, 40}, true);
   outer->ChildPushBack(inner);
   auto grower = AddFixed(inner.get(), {0, 0, 100, 40}, {100, 55});
   auto below = AddFixed(outer.get(), {0, 50, 100, 20});
   // A plain sub-view holding an auto-layout view: the view below it is laid out too.
   auto plain = AddFixed(outer.get(), {0, 80, 100, 10});
-  auto deep = velkcore::MakeIntrusive<UI_LayoutView>();
-  deep->UI_SetLocalRectF({0, 0, 50, 5});
-  deep->SetLayoutEnabled(true);
-  deep->SetMaintainMargins(true);
+  auto deep = MakeView({0, 0, 50, 5}, true);
   plain->ChildPushBack(deep);
   auto deepChild = AddFixed(deep.get(), {0, 0, 50, 5}, {50, 9});
 
