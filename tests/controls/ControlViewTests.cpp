@@ -5,6 +5,7 @@
 #include <velkui/controls/PopupToggler.h>
 #include <velkui/controls/UI_ContainerControlView.h>
 #include <velkui/controls/UI_TextButton.h>
+#include <velkui/test/ErrorOf.h>
 
 #include "ControlTestSupport.h"
 
@@ -143,12 +144,9 @@ TEST_F(ControlViewTest, MessagesCheckTheirSubject) {
   UI_ControlChangedMessage message(control.get());
   EXPECT_EQ(message.GetControl(), control.get());
   message.SetSubject(root.get());
-  try {
-    message.GetControl();
-    FAIL() << "a root is not a control";
-  } catch (const velkcore::Exception& e) {
-    EXPECT_EQ(e.GetNumber(), velkcore::kInvalidTypeConversionNumber);
-  }
+  const auto error = velkui::test::ErrorOf([&] { message.GetControl(); });  // a root is no control
+  ASSERT_TRUE(error.has_value());
+  EXPECT_EQ(error->GetNumber(), velkcore::kInvalidTypeConversionNumber);
 }
 
 TEST_F(ControlViewTest, ForwardedMessagesComeFromTheParentControl) {

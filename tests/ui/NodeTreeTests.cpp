@@ -5,6 +5,7 @@
 #include <cmath>
 
 #include <velkcore/Error.h>
+#include <velkui/test/ErrorOf.h>
 #include <velkui/ui/UI_SubView.h>
 
 #include "NodeTestSupport.h"
@@ -12,23 +13,15 @@
 namespace velkui::ui::test {
 namespace {
 
+using velkui::test::ErrorOf;
+using velkui::test::RaisesContractViolation;
+
 using NodeTreeTest = NodeTest<UI_NodeManager>;
 
 void ExpectIndicesMatchPositions(const UI_Container& container) {
   for (std::size_t i = 0; i < container.ChildSize(); ++i) {
     EXPECT_EQ(container.ChildGet(i)->UI_GetIndex(), static_cast<std::int32_t>(i));
     EXPECT_EQ(container.ChildGet(i)->UI_GetParentContainer(), &container);
-  }
-}
-
-void ExpectContractViolation(const std::function<void()>& f) {
-  try {
-    f();
-    ADD_FAILURE() << "no error raised";
-  } catch (const velkcore::Exception& e) {
-    EXPECT_EQ(e.GetLevel(), velkcore::ErrorLevel::kContractViolation);
-    EXPECT_EQ(e.GetCategory(), 105);
-    EXPECT_EQ(e.GetNumber(), 25);
   }
 }
 
@@ -92,11 +85,11 @@ TEST_F(NodeTreeTest, AddingANodeToItselfOrBelowItselfIsRejected) {
   auto root = View("root");
   auto child = View("child", root.get());
   auto grandChild = View("grandChild", child.get());
-  ExpectContractViolation([&] { root->ChildPushBack(root); });
-  ExpectContractViolation([&] { grandChild->ChildPushBack(root); });
-  ExpectContractViolation([&] { child->ChildInsert(0, root); });
-  ExpectContractViolation([&] { root->ChildPushBack(nullptr); });
-  ExpectContractViolation([&] { root->ChildInsert(5, View("late")); });
+  EXPECT_TRUE(RaisesContractViolation([&] { root->ChildPushBack(root); }));
+  EXPECT_TRUE(RaisesContractViolation([&] { grandChild->ChildPushBack(root); }));
+  EXPECT_TRUE(RaisesContractViolation([&] { child->ChildInsert(0, root); }));
+  EXPECT_TRUE(RaisesContractViolation([&] { root->ChildPushBack(nullptr); }));
+  EXPECT_TRUE(RaisesContractViolation([&] { root->ChildInsert(5, View("late")); }));
   EXPECT_EQ(child->UI_GetParentNode(), root.get());
   EXPECT_EQ(root->UI_GetParentContainer(), nullptr);
 }
@@ -117,7 +110,7 @@ TEST_F(NodeTreeTest, RemovalKeepsTheChildAliveAndRequestRemoveRefusesStrangers) 
 
   EXPECT_FALSE(root->ChildRequestRemove(removed.get()));
   EXPECT_EQ(root->ChildSize(), 0u);
-  ExpectContractViolation([&] { root->ChildRemove(removed.get()); });
+  EXPECT_TRUE(RaisesContractViolation([&] { root->ChildRemove(removed.get()); }));
 }
 
 TEST_F(NodeTreeTest, ABareContainerIsNoParentNodeAndReleasesItsChildren) {
@@ -346,14 +339,11 @@ TEST_F(NodeTreeTest, AConversionToAnAncestorOutsideTheTreeRaisesParentNotFound) 
   auto stranger = View("stranger");
   EXPECT_EQ(child->UI_GetSelfToSpecificParentMatrix(root.get()), (ScaleMatrixT<float>{3, 4, 1, 1}));
   EXPECT_EQ(child->UI_GetSelfToSpecificParentMatrix(child.get()), ScaleMatrixT<float>{});
-  try {
-    child->UI_GetSelfToSpecificParentMatrix(stranger.get());
-    FAIL() << "no error raised";
-  } catch (const velkcore::Exception& e) {
-    EXPECT_EQ(e.GetCategory(), 103);
-    EXPECT_EQ(e.GetNumber(), 7);
-    EXPECT_EQ(e.GetKey(), "$$$/velkui/ui/Error/ParentNotFound=Parent not found.");
-  }
+  const auto error = ErrorOf([&] { child->UI_GetSelfToSpecificParentMatrix(stranger.get()); });
+  ASSERT_TRUE(error.has_value());
+  EXPECT_EQ(error->GetCategory(), 103);
+  EXPECT_EQ(error->GetNumber(), 7);
+  EXPECT_EQ(error->GetKey(), "$$$/velkui/ui/Error/ParentNotFound=Parent not found.");
   child->UI_SetMatrix({0, 0, 0, 1});
   EXPECT_THROW(child->UI_GlobalToLocalF(PointT<float>{1, 1}), velkcore::Exception);
 }

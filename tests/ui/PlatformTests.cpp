@@ -66,6 +66,7 @@ TEST(PlatformChoiceTest, TheBackendComesFromTheEnvironmentWithoutSilentFallback)
     const ScopedEnvironment display("DISPLAY", ":4093");
     EXPECT_EQ(ErrorNumberOf([] { CreatePlatformFromEnvironment(); }, &message), 20);
     EXPECT_NE(message.find("\"x11\""), std::string::npos) << message;
+    EXPECT_NE(message.find(":4093"), std::string::npos) << message;
     EXPECT_EQ(ErrorNumberOf([] { CreatePlatform("x11"); }), 20);
   }
   EXPECT_EQ(ErrorNumberOf([] { CreatePlatform("wayland"); }, &message), 21);

@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 
 #include <velkcore/Error.h>
+#include <velkui/test/ErrorOf.h>
 #include <velkui/test/PixelProbe.h>
 #include <velkui/ui/OS_ToolTip.h>
 #include <velkui/ui/Theme.h>
@@ -220,14 +221,11 @@ TEST_F(ToolTipTest, DisabledTipsAndFailingFactories) {
   tips.SetTipsEnabled(true);
 
   UI_ToolTipManager broken;
-  try {
-    broken.DisplayTip(u"text", gain.get(), 0);
-    FAIL() << "no error";
-  } catch (const velkcore::Exception& e) {
-    EXPECT_EQ(e.GetCategory(), velkcore::kCategoryUserInterface);
-    EXPECT_EQ(e.GetNumber(), 6);
-    EXPECT_STREQ(e.what(), "Unknown tool tip error.");
-  }
+  const auto error = velkui::test::ErrorOf([&] { broken.DisplayTip(u"text", gain.get(), 0); });
+  ASSERT_TRUE(error.has_value());
+  EXPECT_EQ(error->GetCategory(), velkcore::kCategoryUserInterface);
+  EXPECT_EQ(error->GetNumber(), 6);
+  EXPECT_STREQ(error->what(), "Unknown tool tip error.");
   UI_ToolTipManager nullFactory(
       [](const velkcore::UTF16String&, UI_Node*, std::int32_t) { return UI_ToolTipP(); });
   EXPECT_THROW(nullFactory.DisplayTip(u"text", gain.get(), 0), velkcore::Exception);

@@ -182,23 +182,5 @@ TEST_F(X11WindowTest, TransparentCornersOfAPopupAreCutOutOfItsShape) {
   x11.DestroyWindow(popup);
 }
 
-TEST(X11PlatformChoiceTest, AMissingDisplayIsTheBackendUnavailableErrorNamingIt) {
-  const std::string saved = std::getenv("DISPLAY") != nullptr ? std::getenv("DISPLAY") : "";
-  ::setenv("DISPLAY", ":4093", 1);
-  std::string message;
-  std::int32_t number = -1;
-  try {
-    CreatePlatform("x11");
-  } catch (const velkcore::Exception& e) {
-    number = e.GetNumber();
-    message = e.what();
-  }
-  ::setenv("DISPLAY", saved.c_str(), 1);
-  EXPECT_EQ(number, 20);
-  EXPECT_NE(message.find("\"x11\""), std::string::npos) << message;
-  EXPECT_NE(message.find(":4093"), std::string::npos) << message;
-  EXPECT_EQ(CreatePlatform("x11")->GetName(), "x11");
-}
-
 }  // namespace
 }  // namespace velkui::ui::x11test
