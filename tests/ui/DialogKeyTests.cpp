@@ -106,10 +106,7 @@ TEST_F(DialogKeyTest, EscapePressesTheCancelButtonWithoutTouchingTheResponseItse
   auto dialog = velkcore::MakeIntrusive<OS_Dialog>(
       Params(main.get()), velkcore::MakeIntrusive<UI_DialogViewContainer>());
   auto& container = static_cast<UI_DialogViewContainer&>(dialog->GetContentContainer());
-  auto cancel = velkcore::MakeIntrusive<controls::UI_TextButton>(u"Cancel");
-  cancel->UI_SetLocalRectF({10, 10, 80, 24});
-  cancel->UI_Show(true);
-  container.ChildPushBack(cancel);
+  auto cancel = MakeView<controls::UI_TextButton>(&container, {10, 10, 80, 24}, u"Cancel");
   const auto presses = CountPresses(*cancel);
   UI_Node* focusWhenPressed = nullptr;
   cancel->NotifyWhenChanged(std::make_shared<controls::ControlCallback>(
@@ -146,15 +143,10 @@ TEST_F(DialogKeyTest, ReturnPressesTheShownDefaultButtonBeforeTheOkButton) {
   auto dialog = MakeDialog(main.get());
   auto ok = AddButton(*dialog, u"OK", {120, 120, 80, 24});
   dialog->SetOkButton(ok);
-  auto panel = velkcore::MakeIntrusive<UI_SubView>();
-  panel->UI_SetLocalRectF({0, 0, 300, 100});
-  panel->UI_Show(true);
+  auto panel = MakeView<UI_SubView>(nullptr, {0, 0, 300, 100});
   dialog->GetContentContainer().ChildInsert(dialog->GetContentContainer().ChildBegin(), panel);
-  auto search = velkcore::MakeIntrusive<controls::UI_TextButton>(u"Search");
-  search->UI_SetLocalRectF({10, 10, 80, 24});
-  search->UI_Show(true);
+  auto search = MakeView<controls::UI_TextButton>(panel.get(), {10, 10, 80, 24}, u"Search");
   search->SetDefaultAppearance(true);
-  panel->ChildPushBack(search);
   const auto searchPresses = CountPresses(*search);
   const auto okPresses = CountPresses(*ok);
   std::vector<Response> asked;

@@ -50,11 +50,7 @@ class DialogTest : public WindowTest {
   static boost::intrusive_ptr<controls::UI_TextButton> AddButton(UI_Dialog& dialog,
                                                                  const std::u16string& text,
                                                                  const RectT<float>& frame) {
-    auto button = velkcore::MakeIntrusive<controls::UI_TextButton>(text);
-    button->UI_SetLocalRectF(frame);
-    button->UI_Show(true);
-    dialog.GetContentContainer().ChildPushBack(button);
-    return button;
+    return MakeView<controls::UI_TextButton>(&dialog.GetContentContainer(), frame, text);
   }
   // Counts the changed messages of `button`.
   std::shared_ptr<int> CountPresses(controls::UI_Button& button) {

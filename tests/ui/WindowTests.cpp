@@ -223,10 +223,7 @@ TEST_F(WindowLifecycleTest, AWindowLeftOffScreenByAMonitorChangeComesBack) {
 TEST_F(WindowLifecycleTest, AViewContainerFollowsItsNodeInsideTheHost) {
   auto window = MakeWindow({100, 100, 400, 300});
   auto panel = View(window.get(), {50, 40, 300, 200}, "panel");
-  auto container = velkcore::MakeIntrusive<OS_ViewContainer>(true);
-  container->UI_SetLocalRectF({10, 10, 100, 50});
-  container->UI_Show(true);
-  panel->ChildPushBack(container);
+  auto container = MakeView<OS_ViewContainer>(panel.get(), {10, 10, 100, 50}, true);
   const PlatformWindow handle = Handle(*container);
   ASSERT_NE(handle, kNoPlatformWindow);
   EXPECT_EQ(headless.GetClientRect(handle), (RectT<std::int32_t>{160, 150, 100, 50}));
@@ -248,10 +245,7 @@ TEST_F(WindowLifecycleTest, AViewContainerFollowsItsNodeInsideTheHost) {
 
 TEST_F(WindowLifecycleTest, APopupViewContainerFollowsOnScreen) {
   auto window = MakeWindow({100, 100, 400, 300}, kStyleCaption);
-  auto popup = velkcore::MakeIntrusive<OS_PopupViewContainer>();
-  popup->UI_SetLocalRectF({10, 20, 80, 40});
-  popup->UI_Show(true);
-  window->ChildPushBack(popup);
+  auto popup = MakeView<OS_PopupViewContainer>(window.get(), {10, 20, 80, 40});
   const PlatformWindow handle = Handle(*popup);
   ASSERT_NE(handle, kNoPlatformWindow);
   EXPECT_EQ(headless.GetWindowParent(handle), Handle(*window));
@@ -266,11 +260,8 @@ TEST_F(WindowLifecycleTest, APopupViewContainerFollowsOnScreen) {
 
 TEST_F(WindowLifecycleTest, ASubWindowSendsItsMouseToItsProxy) {
   auto window = MakeWindow({0, 0, 400, 300});
-  auto subView = velkcore::MakeIntrusive<UI_SubWindowView>();
-  subView->UI_SetLocalRectF({100, 50, 200, 100});
-  subView->UI_Show(true);
   auto proxy = MakeView<RecordingView>(window.get(), {0, 0, 400, 300}, "proxy", log);
-  window->ChildPushBack(subView);
+  auto subView = MakeView<UI_SubWindowView>(window.get(), {100, 50, 200, 100});
   SubWindow* sub = subView->GetSubWindow();
   ASSERT_NE(sub, nullptr);
   const PlatformWindow handle = Handle(*sub);
