@@ -17,6 +17,7 @@
 
 using namespace velkcore;
 using velkcore_test::ErrorOf;
+using velkcore_test::Match;
 using velkcore_test::Raises;
 namespace fs = std::filesystem;
 
@@ -95,7 +96,8 @@ TEST_F(FileTest, FileFailuresNameThePath) {
            [&] { File(dir_ / "sub").Create(); }, [&] { RemoveFile(dir_ / "sub"); },
            [&] { FileByteStream stream(dir_ / "sub"); }}) {
     EXPECT_TRUE(Raises(action, kFileWrongKindKey,
-                       "The path '" + (dir_ / "sub").string() + "' is a directory.", true));
+                       "The path '" + (dir_ / "sub").string() + "' is a directory.",
+                       Match::kWhole));
   }
   EXPECT_TRUE(fs::is_directory(dir_ / "sub"));
 }
@@ -145,7 +147,7 @@ TEST_F(FileTest, ByteStreamReadsExactRanges) {
   EXPECT_TRUE(Raises([&] { stream->ReadBlock(8, buffer, 3); }, kFileReadOutOfRangeKey,
                      "Cannot read 3 bytes at offset 8 of '" + (dir_ / "data").string() +
                          "', which holds 10 bytes.",
-                     true));
+                     Match::kWhole));
   EXPECT_TRUE(Raises([&] { FileByteStream stream(dir_ / "none"); }, kFileCannotOpenKey,
                      (dir_ / "none").string()));
   EXPECT_EQ(ReadFileContents(dir_ / "data"), "0123456789");

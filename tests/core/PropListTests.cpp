@@ -11,6 +11,7 @@
 
 using namespace velkcore;
 using velkcore_test::ErrorOf;
+using velkcore_test::Match;
 using velkcore_test::Raises;
 
 namespace {
@@ -142,7 +143,7 @@ TEST(PropList, OtherMismatchesRaiseNamingKeyAndTypes) {
       {[&] { list.GetSubList("name"); }, "The property 'name' holds string, not property list."},
   };
   for (const auto& [get, message] : cases) {
-    EXPECT_TRUE(Raises(get, kPropListTypeMismatchKey, message, true)) << message;
+    EXPECT_TRUE(Raises(get, kPropListTypeMismatchKey, message, Match::kWhole)) << message;
   }
 }
 
@@ -257,7 +258,7 @@ TEST(PropList, RectangleRecordsThatAreIncompleteOrMistyped) {
        },
        "The property 'height' holds string, not float."},
   };
-  for (const auto& [read, message] : cases) EXPECT_TRUE(Raises(read, "", message, true));
+  for (const auto& [read, message] : cases) EXPECT_TRUE(Raises(read, "", message, Match::kWhole));
   EXPECT_EQ(f, (RectT<float>{1, 2, 3, 4}));
   EXPECT_EQ(p, (PointT<float>{5, 6}));
 }

@@ -18,6 +18,7 @@
 
 using namespace velkcore;
 using velkcore_test::ErrorOf;
+using velkcore_test::Match;
 using velkcore_test::Raises;
 
 namespace {
@@ -191,9 +192,10 @@ TEST(PropListXML, ListsNestUpToTheLimit) {
   EXPECT_EQ(ReadPropList(Nested(kMaxPropListDepth)), deepest);
 
   const std::size_t column = Nested(kMaxPropListDepth + 1).find("<prop.list/>") + 1;
-  EXPECT_TRUE(Raises(
-      [] { ReadPropList(Nested(kMaxPropListDepth + 1)); }, kPropListTooDeepKey,
-      "Lists nest deeper than 256 levels at line 1, column " + std::to_string(column) + ".", true));
+  EXPECT_TRUE(
+      Raises([] { ReadPropList(Nested(kMaxPropListDepth + 1)); }, kPropListTooDeepKey,
+             "Lists nest deeper than 256 levels at line 1, column " + std::to_string(column) + ".",
+             Match::kWhole));
   EXPECT_TRUE(
       Raises([] { WritePropList(NestedList(kMaxPropListDepth + 1)); }, kPropListWriteTooDeepKey));
 }
