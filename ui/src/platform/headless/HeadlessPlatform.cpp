@@ -18,6 +18,7 @@
 #include <velkui/ui/OS_MessagePump.h>
 
 #include "../common/PixelBuffer.h"
+#include "../common/QueueSearch.h"
 #include "../common/WindowTable.h"
 #include "HeadlessKeyboard.h"
 
@@ -135,6 +136,21 @@ struct HeadlessPlatform::Impl {
 
   RectT<std::int32_t> ScreenFrame(const WindowRecord& record) const {
     return platform::FrameAround(windows.ScreenClient(record), InsetsFor(record.style));
+  }
+
+  // The first window, in the order of GetWindows, that `wanted` accepts.
+  template <typename Predicate>
+  PlatformWindow FindInStackingOrder(const Predicate& wanted) const {
+    return FindAmong(stacking, wanted);
+  }
+  template <typename Predicate>
+  PlatformWindow FindAmong(const std::vector<PlatformWindow>& handles,
+                           const Predicate& wanted) const {
+    for (const PlatformWindow handle : handles) {
+      if (wanted(handle)) return handle;
+      if (const PlatformWindow found = FindAmong(windows.ChildrenOf(handle), wanted)) return found;
+    }
+    return kNoPlatformWindow;
   }
 
   PlatformWindow DeepestAt(PlatformWindow handle, const PointT<std::int32_t>& p) const {
@@ -590,11 +606,10 @@ void HeadlessPlatform::SetMonitors(std::vector<MonitorDescription> monitors) {
 
 std::vector<PlatformWindow> HeadlessPlatform::GetWindows() const {
   std::vector<PlatformWindow> result;
-  std::function<void(PlatformWindow)> add = [&](PlatformWindow handle) {
+  impl_->FindInStackingOrder([&result](PlatformWindow handle) {
     result.push_back(handle);
-    for (const PlatformWindow child : impl_->windows.ChildrenOf(handle)) add(child);
-  };
-  for (const PlatformWindow window : impl_->stacking) add(window);
+    return false;
+  });
   return result;
 }
 
@@ -939,21 +954,11 @@ void HeadlessPlatform::TrackPointerLeave(PlatformWindow window) {
 }
 
 bool HeadlessPlatform::HasPendingPointerMove(PlatformWindow window) const {
-  return std::any_of(impl_->queue.begin(), impl_->queue.end(), [window](const OS_Event& e) {
-    return e.GetWindow() == window && e.GetMsg() == kMsgPointerMove;
-  });
+  return platform::HasPointerMoveFor(impl_->queue, window);
 }
 
 bool HeadlessPlatform::RemovePendingCharacter(char16_t character) {
-  auto& queue = impl_->queue;
-  const auto first = std::find_if(queue.begin(), queue.end(),
-                                  [](const OS_Event& e) { return IsKeyboardMessage(e.GetMsg()); });
-  if (first == queue.end()) return false;
-  const bool isIt = (first->GetMsg() == kMsgChar || first->GetMsg() == kMsgSysChar) &&
-                    first->GetWParam() == static_cast<std::uint64_t>(character);
-  if (!isIt) return false;
-  queue.erase(first);
-  return true;
+  return platform::RemoveLeadingCharacter(impl_->queue, character);
 }
 
 KeyState HeadlessPlatform::GetKeyState(std::int16_t virtualKey) const {
@@ -1025,13 +1030,11 @@ bool HeadlessPlatform::GetNextEvent(OS_Event& event, bool) {
   }
   if (d.queue.empty()) d.PostDueTimer();
   if (d.queue.empty()) {
-    for (const PlatformWindow handle : GetWindows()) {
-      if (d.windows.IsPaintable(*d.windows.Find(handle))) {
-        event = OS_Event(handle, kMsgPaint, 0, 0, d.now);
-        return true;
-      }
-    }
-    return false;
+    const PlatformWindow paintable = d.FindInStackingOrder(
+        [&d](PlatformWindow handle) { return d.windows.IsPaintable(*d.windows.Find(handle)); });
+    if (paintable == kNoPlatformWindow) return false;
+    event = OS_Event(paintable, kMsgPaint, 0, 0, d.now);
+    return true;
   }
   event = d.queue.front();
   d.queue.pop_front();

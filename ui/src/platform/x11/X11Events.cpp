@@ -267,7 +267,7 @@ void X11Platform::Impl::HandleExpose(const XExposeEvent& event) {
   if (record->buffer && record->buffer->IsComplete()) {
     record->buffer->Present({area});
   } else {
-    AddPendingArea(*record, &area);
+    platform::AddPendingArea(*record, &area);
   }
 }
 
@@ -335,7 +335,7 @@ void X11Platform::Impl::ReadWindowState(WindowRecord& record) {
       if (active == record.handle) ActivateNextAfter(record.handle);
     } else if (state == NormalState && record.minimized) {
       record.minimized = false;
-      AddPendingArea(record, nullptr);
+      platform::AddPendingArea(record, nullptr);
     }
   }
   if (data != nullptr) XFree(data);

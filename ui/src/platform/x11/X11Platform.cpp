@@ -16,6 +16,7 @@
 #include <velkcore/Error.h>
 
 #include "../common/PixelBuffer.h"
+#include "../common/QueueSearch.h"
 #include "X11Monitors.h"
 #include "X11PlatformImpl.h"
 
@@ -980,23 +981,12 @@ void X11Platform::TrackPointerLeave(PlatformWindow window) {
 
 bool X11Platform::HasPendingPointerMove(PlatformWindow window) const {
   impl_->DrainConnection();
-  return std::any_of(impl_->queue.begin(), impl_->queue.end(), [window](const QueuedMessage& m) {
-    return m.event.GetWindow() == window && m.event.GetMsg() == kMsgPointerMove;
-  });
+  return platform::HasPointerMoveFor(impl_->queue, window);
 }
 
 bool X11Platform::RemovePendingCharacter(char16_t character) {
-  Impl& d = *impl_;
-  d.DrainConnection();
-  const auto first = std::find_if(d.queue.begin(), d.queue.end(), [](const QueuedMessage& m) {
-    return IsKeyboardMessage(m.event.GetMsg());
-  });
-  if (first == d.queue.end()) return false;
-  const bool isIt = (first->event.GetMsg() == kMsgChar || first->event.GetMsg() == kMsgSysChar) &&
-                    first->event.GetWParam() == static_cast<std::uint64_t>(character);
-  if (!isIt) return false;
-  d.queue.erase(first);
-  return true;
+  impl_->DrainConnection();
+  return platform::RemoveLeadingCharacter(impl_->queue, character);
 }
 
 KeyState X11Platform::GetKeyState(std::int16_t virtualKey) const {
