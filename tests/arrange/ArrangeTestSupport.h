@@ -7,11 +7,11 @@
 
 #include <gtest/gtest.h>
 
-#include <velkcore/Error.h>
 #include <velkui/arrange/DefaultGroup.h>
 #include <velkui/arrange/DynamicGroup.h>
 #include <velkui/arrange/Groups.h>
 #include <velkui/arrange/Single.h>
+#include <velkui/test/ErrorOf.h>
 
 namespace velkui::arrange::test {
 
@@ -141,17 +141,7 @@ inline bool HasNaN(const RectF& r) {
   return std::isnan(r.left) || std::isnan(r.top) || std::isnan(r.width) || std::isnan(r.height);
 }
 
-inline bool IsContractViolation(const velkcore::Exception& e) {
-  return e.GetLevel() == velkcore::ErrorLevel::kContractViolation && e.GetCategory() == 105 &&
-         e.GetNumber() == 25;
-}
-
-#define EXPECT_CONTRACT_VIOLATION(statement)         \
-  try {                                              \
-    statement;                                       \
-    ADD_FAILURE() << "no contract violation";        \
-  } catch (const velkcore::Exception& e) {           \
-    EXPECT_TRUE(IsContractViolation(e)) << e.what(); \
-  }
+#define EXPECT_CONTRACT_VIOLATION(statement) \
+  EXPECT_TRUE(::velkui::test::RaisesContractViolation([&] { statement; }))
 
 }  // namespace velkui::arrange::test

@@ -13,6 +13,7 @@
 #include <velkcore/Geometry.h>
 #include <velkcore/RefCountedObject.h>
 #include <velkui/layout/SmartLayout.h>
+#include <velkui/test/ErrorOf.h>
 #include <velkui/ui/UI_ArrangementView.h>
 #include <velkui/ui/UI_SubView.h>
 
@@ -85,22 +86,8 @@ inline std::string Describe(const RectT<float>& r) {
 #define EXPECT_SAME_RECT(actual, expected) \
   EXPECT_EQ(::velkui::layout::test::Describe(actual), ::velkui::layout::test::Describe(expected))
 
-// Whether `f` raises the input-contract violation (category 105, number 25).
-template <typename F>
-::testing::AssertionResult ViolatesContract(F&& f) {
-  try {
-    f();
-  } catch (const velkcore::Exception& e) {
-    if (e.GetCategory() == 105 && e.GetNumber() == velkcore::kInputContractViolationNumber) {
-      return ::testing::AssertionSuccess();
-    }
-    return ::testing::AssertionFailure() << "another error: " << e.GetKey();
-  }
-  return ::testing::AssertionFailure() << "no error";
-}
-
 #define EXPECT_CONTRACT_VIOLATION(statement) \
-  EXPECT_TRUE(::velkui::layout::test::ViolatesContract([&] { statement; }))
+  EXPECT_TRUE(::velkui::test::RaisesContractViolation([&] { statement; }))
 
 // A window stand-in (0, 0, 400, 300) holding a panel at (30, 40), into which arrangement views
 // go: a view made at its default frame has its origin at (40, 60) in global coordinates.

@@ -9,6 +9,7 @@
 
 #include <velkcore/Error.h>
 #include <velkui/pictel/PictelHandles.h>
+#include <velkui/test/ErrorOf.h>
 #include <velkui/test/RecordingSupplier.h>
 
 namespace velkui::pictel::test {
@@ -16,14 +17,12 @@ namespace velkui::pictel::test {
 // The drawing error (category 101, level error) `action` raised, if any.
 template <typename Action>
 std::optional<velkcore::Exception> DrawingError(Action action) {
-  try {
-    action();
-  } catch (const velkcore::Exception& e) {
-    EXPECT_EQ(101, e.GetCategory());
-    EXPECT_EQ(velkcore::ErrorLevel::kError, e.GetLevel());
-    return e;
+  auto error = velkui::test::ErrorOf(action);
+  if (error) {
+    EXPECT_EQ(101, error->GetCategory());
+    EXPECT_EQ(velkcore::ErrorLevel::kError, error->GetLevel());
   }
-  return std::nullopt;
+  return error;
 }
 
 // The number of the drawing error `action` raised, 0 for none.
