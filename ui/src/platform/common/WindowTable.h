@@ -36,7 +36,6 @@ struct WindowRecordBase {
   PlatformWindow handle = kNoPlatformWindow;
   // The parent of a child window, the owner of any other.
   PlatformWindow parent = kNoPlatformWindow;
-  bool child = false;
   velkcore::UTF16String title;
   // Screen coordinates for top-level windows; relative to the parent's client
   // origin for child windows.
@@ -52,6 +51,8 @@ struct WindowRecordBase {
   std::vector<RectT<std::int32_t>> pending;
   bool trackLeave = false;
   std::int32_t paintCount = 0;
+
+  bool IsChild() const { return (style & kStyleChild) != 0; }
 };
 
 // Adds `rect` (client pixels; null: the whole client area) to the pending area.
@@ -92,7 +93,7 @@ class WindowTable {
 
   PointT<std::int32_t> ClientOrigin(const WindowRecordBase& record) const {
     PointT<std::int32_t> origin{record.client.left, record.client.top};
-    if (record.child) {
+    if (record.IsChild()) {
       if (const Record* parent = Find(record.parent)) {
         const PointT<std::int32_t> base = ClientOrigin(*parent);
         origin.x += base.x;
@@ -117,7 +118,7 @@ class WindowTable {
   // Shown with every ancestor, not minimized.
   bool IsShownOnScreen(const WindowRecordBase& record) const {
     if (!record.visible || record.minimized) return false;
-    if (!record.child) return true;
+    if (!record.IsChild()) return true;
     const Record* parent = Find(record.parent);
     return parent != nullptr && IsShownOnScreen(*parent);
   }
@@ -134,7 +135,7 @@ class WindowTable {
   }
   PlatformWindow TopLevelOf(PlatformWindow handle) const {
     const Record* record = Find(handle);
-    while (record != nullptr && record->child) record = Find(record->parent);
+    while (record != nullptr && record->IsChild()) record = Find(record->parent);
     return record != nullptr ? record->handle : kNoPlatformWindow;
   }
   // `handle` is `ancestor` or lies inside it.
@@ -147,21 +148,21 @@ class WindowTable {
   std::vector<PlatformWindow> ChildrenOf(PlatformWindow handle) const {
     std::vector<PlatformWindow> children;
     for (const auto& [h, record] : records_) {
-      if (record.child && record.parent == handle) children.push_back(h);
+      if (record.IsChild() && record.parent == handle) children.push_back(h);
     }
     return children;
   }
   std::vector<PlatformWindow> TopLevels() const {
     std::vector<PlatformWindow> tops;
     for (const auto& [h, record] : records_) {
-      if (!record.child) tops.push_back(h);
+      if (!record.IsChild()) tops.push_back(h);
     }
     return tops;
   }
 
  private:
   const Record* ParentOf(const Record& record) const {
-    return record.child ? Find(record.parent) : nullptr;
+    return record.IsChild() ? Find(record.parent) : nullptr;
   }
 
   Map records_;

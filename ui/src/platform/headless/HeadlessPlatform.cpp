@@ -721,7 +721,6 @@ PlatformWindow HeadlessPlatform::CreateWindow(const WindowCreateParams& params) 
   WindowRecord record;
   record.handle = d.nextHandle++;
   record.parent = params.parent;
-  record.child = child;
   record.title = params.title;
   record.style = params.style;
   record.exStyle = params.exStyle;
@@ -776,14 +775,14 @@ void HeadlessPlatform::ShowWindow(PlatformWindow window, bool show, bool activat
         d.PostLeaveIfTracked(d.hover);
         d.hover = kNoPlatformWindow;
       }
-      if (!record->child) {
+      if (!record->IsChild()) {
         d.ActivateNextAfter(window);
       } else if (d.windows.IsWithin(d.focus, window)) {
         d.SetFocus(d.windows.TopLevelOf(window));
       }
     }
   }
-  if (show && activate && !record->child) d.Activate(window, false);
+  if (show && activate && !record->IsChild()) d.Activate(window, false);
 }
 
 bool HeadlessPlatform::IsWindowVisible(PlatformWindow window) const {
@@ -794,7 +793,7 @@ bool HeadlessPlatform::IsWindowVisible(PlatformWindow window) const {
 void HeadlessPlatform::MinimizeWindow(PlatformWindow window, bool minimize) {
   Impl& d = *impl_;
   WindowRecord* record = d.windows.Find(window);
-  if (record == nullptr || record->child || record->minimized == minimize) return;
+  if (record == nullptr || record->IsChild() || record->minimized == minimize) return;
   record->minimized = minimize;
   if (minimize) {
     d.ActivateNextAfter(window);
@@ -846,7 +845,7 @@ void HeadlessPlatform::SetTransparentColorKey(PlatformWindow window,
 void HeadlessPlatform::SetWindowParent(PlatformWindow window, PlatformWindow parent) {
   Impl& d = *impl_;
   WindowRecord* record = d.windows.Find(window);
-  if (record == nullptr || !record->child || d.windows.Find(parent) == nullptr) return;
+  if (record == nullptr || !record->IsChild() || d.windows.Find(parent) == nullptr) return;
   // A window cannot go inside itself.
   velkcore::RequireInput(!d.windows.IsWithin(parent, window));
   record->parent = parent;
@@ -870,7 +869,7 @@ void HeadlessPlatform::SetClientRect(PlatformWindow window, const RectT<std::int
   WindowRecord* record = d.windows.Find(window);
   if (record == nullptr) return;
   platform::MoveClient(*record,
-                       record->child ? d.windows.InParentClient(record->parent, rect) : rect);
+                       record->IsChild() ? d.windows.InParentClient(record->parent, rect) : rect);
 }
 
 RectT<std::int32_t> HeadlessPlatform::GetFrameRect(PlatformWindow window) const {

@@ -101,7 +101,7 @@ void X11Platform::Impl::HandleEvent(XEvent& event) {
       break;
     case ReparentNotify:
       if (WindowRecord* record = windows.Find(event.xreparent.window)) {
-        if (!record->child) record->reparented = event.xreparent.parent != connection.Root();
+        if (!record->IsChild()) record->reparented = event.xreparent.parent != connection.Root();
       }
       break;
     case UnmapNotify:
@@ -273,7 +273,7 @@ void X11Platform::Impl::HandleExpose(const XExposeEvent& event) {
 
 void X11Platform::Impl::HandleConfigure(const XConfigureEvent& event) {
   WindowRecord* record = windows.Find(event.window);
-  if (record == nullptr || record->child) return;
+  if (record == nullptr || record->IsChild()) return;
   RectT<std::int32_t> reported{event.x, event.y, event.width, event.height};
   if (record->reparented && !event.send_event) {
     // Relative to the window manager's frame: ask where that puts it.

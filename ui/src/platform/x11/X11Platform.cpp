@@ -501,7 +501,7 @@ boost::intrusive_ptr<pictel::ImageInterface> X11Platform::CaptureWindowPixels(
 void X11Platform::ResizeFromOutside(PlatformWindow window, const RectT<std::int32_t>& client) {
   velkcore::RequireInput(client.width > 0 && client.height > 0);
   const WindowRecord* record = impl_->windows.Find(window);
-  velkcore::RequireInput(record != nullptr && !record->child);
+  velkcore::RequireInput(record != nullptr && !record->IsChild());
   const x11::X11Connection other(DisplayString(impl_->display));
   XMoveResizeWindow(other.Get(), window, client.left, client.top,
                     static_cast<unsigned>(client.width), static_cast<unsigned>(client.height));
@@ -533,7 +533,6 @@ PlatformWindow X11Platform::CreateWindow(const WindowCreateParams& params) {
   const x11::X11Atoms& atoms = d.connection.Atoms();
   WindowRecord record;
   record.parent = params.parent;
-  record.child = child;
   record.overrideRedirect =
       !child && (params.style & kStylePopup) != 0 && !HasCaption(params.style);
   record.title = params.title;
@@ -544,7 +543,7 @@ PlatformWindow X11Platform::CreateWindow(const WindowCreateParams& params) {
   if (managed && d.connection.HasWindowManager() && HasCaption(params.style)) {
     // Until the window manager says otherwise, frames look like the last one.
     for (const auto& [h, other] : d.windows) {
-      if (!other.child && !other.overrideRedirect && HasCaption(other.style))
+      if (!other.IsChild() && !other.overrideRedirect && HasCaption(other.style))
         record.frame = other.frame;
     }
   }
@@ -701,7 +700,7 @@ void X11Platform::ShowWindow(PlatformWindow window, bool show, bool activate) {
   if (record->visible != show) {
     record->visible = show;
     if (show) {
-      if (!record->child && !record->overrideRedirect) {
+      if (!record->IsChild() && !record->overrideRedirect) {
         WriteInitialStates(d.display, d.connection.Atoms(), window, *record);
         // Shown without being activated: a user time of 0 tells the window manager.
         if (!activate) {
@@ -709,7 +708,7 @@ void X11Platform::ShowWindow(PlatformWindow window, bool show, bool activate) {
         }
       }
       if (!record->minimized) {
-        if (record->child) {
+        if (record->IsChild()) {
           XMapWindow(d.display, window);
         } else {
           XMapRaised(d.display, window);
@@ -722,19 +721,19 @@ void X11Platform::ShowWindow(PlatformWindow window, bool show, bool activate) {
         d.PostLeaveIfTracked(d.hover);
         d.hover = kNoPlatformWindow;
       }
-      if (record->child) {
+      if (record->IsChild()) {
         XUnmapWindow(d.display, window);
       } else {
         XWithdrawWindow(d.display, window, d.connection.Screen());
       }
-      if (!record->child) {
+      if (!record->IsChild()) {
         d.ActivateNextAfter(window);
       } else if (d.windows.IsWithin(d.focus, window)) {
         d.SetFocus(d.windows.TopLevelOf(window));
       }
     }
   }
-  if (show && activate && !record->child) d.Activate(window, false, true);
+  if (show && activate && !record->IsChild()) d.Activate(window, false, true);
   XFlush(d.display);
 }
 
@@ -746,7 +745,7 @@ bool X11Platform::IsWindowVisible(PlatformWindow window) const {
 void X11Platform::MinimizeWindow(PlatformWindow window, bool minimize) {
   Impl& d = *impl_;
   WindowRecord* record = d.windows.Find(window);
-  if (record == nullptr || record->child || record->minimized == minimize) return;
+  if (record == nullptr || record->IsChild() || record->minimized == minimize) return;
   record->minimized = minimize;
   if (minimize) {
     if (record->visible) {
@@ -825,7 +824,7 @@ void X11Platform::SetTransparentColorKey(PlatformWindow window,
 void X11Platform::SetWindowParent(PlatformWindow window, PlatformWindow parent) {
   Impl& d = *impl_;
   WindowRecord* record = d.windows.Find(window);
-  if (record == nullptr || !record->child || d.windows.Find(parent) == nullptr) return;
+  if (record == nullptr || !record->IsChild() || d.windows.Find(parent) == nullptr) return;
   velkcore::RequireInput(!d.windows.IsWithin(parent, window));
   record->parent = parent;
   XReparentWindow(d.display, window, parent, record->client.left, record->client.top);
@@ -851,18 +850,18 @@ void X11Platform::SetClientRect(PlatformWindow window, const RectT<std::int32_t>
   WindowRecord* record = d.windows.Find(window);
   if (record == nullptr) return;
   const RectT<std::int32_t> relative =
-      record->child ? d.windows.InParentClient(record->parent, rect) : rect;
+      record->IsChild() ? d.windows.InParentClient(record->parent, rect) : rect;
   // Asking for the geometry the window has brings no answer to wait for.
   const bool unchanged = relative == record->client;
   d.ApplyClientRect(*record, relative);
   const auto width = static_cast<unsigned>(std::max(relative.width, 1));
   const auto height = static_cast<unsigned>(std::max(relative.height, 1));
-  if (!record->child && !unchanged) {
+  if (!record->IsChild() && !unchanged) {
     // The server's answers to these requests are no news.
     record->configureRequests.push_back(relative);
     while (record->configureRequests.size() > 8) record->configureRequests.pop_front();
   }
-  if (!record->child && !record->overrideRedirect) {
+  if (!record->IsChild() && !record->overrideRedirect) {
     XSizeHints hints{};
     // Static gravity: the position asked for is the client area's, whatever the frame.
     hints.flags = USPosition | PPosition | USSize | PSize | PWinGravity;
