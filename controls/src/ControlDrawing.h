@@ -19,6 +19,11 @@ using pictel::ColorRGBA;
 using velkcore::PointT;
 using velkcore::RectT;
 
+// Label text beside a button's face, box or picture.
+inline constexpr ui::UI_Color kLabelColor = 28;
+inline constexpr ui::UI_Color kDisabledLabelColor = 29;
+inline constexpr float kLabelGap = 6.0f;
+
 pictel::ColorRGBA ThemeColor(ui::UI_Color index, const ColorChangeMap* map);
 pictel::ColorRGBA WithAlpha(pictel::ColorRGBA color, float alpha);
 pictel::ColorRGBA Mix(const pictel::ColorRGBA& a, const pictel::ColorRGBA& b, float t);

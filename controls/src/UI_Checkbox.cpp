@@ -11,8 +11,6 @@ namespace velkui::controls {
 
 namespace {
 
-constexpr ui::UI_Color kLabel = 28;
-constexpr ui::UI_Color kDisabledLabel = 29;
 constexpr ui::UI_Color kCheckMark = 36;
 constexpr ui::UI_Color kDisabledCheckMark = 37;
 
@@ -89,7 +87,7 @@ velkcore::RectT<float> UI_Checkbox::GetMarkRect() const {
 
 void UI_Checkbox::DrawLabelText(pictel::Pictel& context, float left) const {
   const velkcore::RectT<float> r = UI_GetLocalRectF(false);
-  const ui::UI_Color color = IsDisabled() ? kDisabledLabel : kLabel;
+  const ui::UI_Color color = IsDisabled() ? detail::kDisabledLabelColor : detail::kLabelColor;
   const std::size_t mnemonic = GetDisplayMnemonic() ? GetMnemonicLocation() : kNoMnemonic;
   detail::DrawLabel(context, displayText_, {left, r.top, r.left + r.width - left, r.height},
                     kControlAlignLeft, detail::TextControlFont(context, *this),

@@ -11,8 +11,6 @@ namespace velkui::controls {
 
 namespace {
 
-constexpr ui::UI_Color kLabel = 28;
-constexpr ui::UI_Color kDisabledLabel = 29;
 constexpr ui::UI_Color kDefaultLabel = 33;
 constexpr float kHorizontalPadding = 10.0f;
 
@@ -65,9 +63,9 @@ class UI_PictureTextButton::Face : public DrawButtonFace {
     pictureRect.top = std::round(pictureRect.top + b.pictureVerticalOffset_);
     if (hasPicture) b.DrawPicture(*context, pictureRect, state);
     if (hasText) {
-      ui::UI_Color color = kLabel;
+      ui::UI_Color color = detail::kLabelColor;
       if (state.IsSet(kControlStateDisabled)) {
-        color = kDisabledLabel;
+        color = detail::kDisabledLabelColor;
       } else if (b.GetDefaultAppearance() && !b.borderNever_) {
         color = kDefaultLabel;
       }

@@ -11,11 +11,8 @@ namespace velkui::controls {
 
 namespace {
 
-constexpr ui::UI_Color kLabel = 28;
-constexpr ui::UI_Color kDisabledLabel = 29;
 constexpr ui::UI_Color kDot = 38;
 constexpr ui::UI_Color kDisabledDot = 37;
-constexpr float kLabelGap = 6.0f;
 
 velkcore::RectT<float> ButtonRect(const UI_RadioButton& radio, float size) {
   const velkcore::RectT<float> r = radio.UI_GetLocalRectF(false);
@@ -24,7 +21,7 @@ velkcore::RectT<float> ButtonRect(const UI_RadioButton& radio, float size) {
 
 void DrawRadioLabel(const UI_RadioButton& radio, pictel::Pictel& context, float left) {
   const velkcore::RectT<float> r = radio.UI_GetLocalRectF(false);
-  const ui::UI_Color color = radio.IsDisabled() ? kDisabledLabel : kLabel;
+  const ui::UI_Color color = radio.IsDisabled() ? detail::kDisabledLabelColor : detail::kLabelColor;
   const std::size_t mnemonic =
       radio.GetDisplayMnemonic() ? radio.GetMnemonicLocation() : UI_ControlView::kNoMnemonic;
   detail::DrawLabel(context, radio.GetDisplayText(),
@@ -92,7 +89,7 @@ void UI_RadioButton::UI_Draw(pictel::Pictel* context) const {
     detail::Fill(*context, detail::EllipsePath(*context, dotRect),
                  detail::ThemeColor(color, &GetColorChangeMap()));
   }
-  DrawRadioLabel(*this, *context, circle.left + circle.width + kLabelGap);
+  DrawRadioLabel(*this, *context, circle.left + circle.width + detail::kLabelGap);
   UI_Button::UI_Draw(context);
 }
 
@@ -101,7 +98,7 @@ velkcore::PointT<float> UI_RadioButton::UI_GetRecommendedSize(pictel::Pictel* co
   const pictel::FontP font = detail::TextControlFont(*context, *this);
   const float text = detail::MeasureText(*context, font, displayText_);
   const float height = std::ceil(font->GetAscent() + font->GetDescent()) + 2.0f;
-  return {std::ceil(buttonSize_ + 2.0f + (text > 0 ? kLabelGap + text : 0.0f)),
+  return {std::ceil(buttonSize_ + 2.0f + (text > 0 ? detail::kLabelGap + text : 0.0f)),
           std::max(buttonSize_ + 2.0f, height)};
 }
 
@@ -139,7 +136,7 @@ void UI_ImageRadioButton::UI_Draw(pictel::Pictel* context) const {
     detail::DrawImageIn(*context, *image,
                         {r.left, std::round(r.top + (r.height - height) / 2), width, height},
                         IsDisabled() ? 0.4f : 1.0f);
-    labelLeft += width + kLabelGap;
+    labelLeft += width + detail::kLabelGap;
   }
   DrawRadioLabel(*this, *context, labelLeft);
   UI_Button::UI_Draw(context);
@@ -153,7 +150,7 @@ velkcore::PointT<float> UI_ImageRadioButton::UI_GetRecommendedSize(pictel::Picte
   const float imageWidth = image ? static_cast<float>(image->GetWidth()) : 0.0f;
   const float imageHeight = image ? static_cast<float>(image->GetHeight()) : 0.0f;
   const float height = std::ceil(font->GetAscent() + font->GetDescent()) + 2.0f;
-  return {std::ceil(imageWidth + (text > 0 ? kLabelGap + text : 0.0f)),
+  return {std::ceil(imageWidth + (text > 0 ? detail::kLabelGap + text : 0.0f)),
           std::max(imageHeight, height)};
 }
 

@@ -11,12 +11,9 @@ namespace velkui::controls {
 
 namespace {
 
-constexpr ui::UI_Color kLabel = 28;
-constexpr ui::UI_Color kDisabledLabel = 29;
 constexpr ui::UI_Color kDefaultLabel = 33;
 constexpr ui::UI_Color kSelectedLabel = 349;
 constexpr float kHorizontalPadding = 12.0f;
-constexpr float kLabelGap = 6.0f;
 
 bool IsReturnOrEnter(const ui::KeyboardEvent& event) {
   const std::uint16_t key = event.GetKeyControlCode();
@@ -35,9 +32,9 @@ class UI_TextButton::Face : public DrawButtonFace {
             const ColorChangeMap* map) const override {
     const velkcore::UTF16String& text = button_.GetDisplayText();
     if (text.empty()) return;
-    ui::UI_Color color = kLabel;
+    ui::UI_Color color = detail::kLabelColor;
     if (state.IsSet(kControlStateDisabled)) {
-      color = kDisabledLabel;
+      color = detail::kDisabledLabelColor;
     } else if (button_.GetDefaultAppearance() && !button_.GetDisplayBorderNever()) {
       color = kDefaultLabel;
     } else if (selected_) {
@@ -138,8 +135,9 @@ void UI_TextButton::UI_Draw(pictel::Pictel* context) const {
   velkcore::RectT<float> rect = parameters.GetRectF();
   if (!GetLabelText().empty()) {
     const pictel::FontP font = detail::TextControlFont(*context, *this);
-    const float labelWidth = detail::MeasureText(*context, font, GetLabelText()) + kLabelGap;
-    const ui::UI_Color color = IsDisabled() ? kDisabledLabel : kLabel;
+    const float labelWidth =
+        detail::MeasureText(*context, font, GetLabelText()) + detail::kLabelGap;
+    const ui::UI_Color color = IsDisabled() ? detail::kDisabledLabelColor : detail::kLabelColor;
     detail::DrawLabel(*context, GetLabelText(), {rect.left, rect.top, labelWidth, rect.height},
                       kControlAlignLeft, font, detail::ThemeColor(color, &GetColorChangeMap()),
                       kNoMnemonic);
@@ -164,7 +162,7 @@ velkcore::PointT<float> UI_TextButton::UI_GetRecommendedSize(pictel::Pictel* con
   }
   width += 2 * (kHorizontalPadding + std::max(textIndent_, 0.0f));
   if (!GetLabelText().empty())
-    width += detail::MeasureText(*context, font, GetLabelText()) + kLabelGap;
+    width += detail::MeasureText(*context, font, GetLabelText()) + detail::kLabelGap;
   const float height = std::ceil(font->GetAscent() + font->GetDescent()) + 10.0f;
   return {std::ceil(std::max(width, 64.0f)), std::max(height, 22.0f)};
 }
