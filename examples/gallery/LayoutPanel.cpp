@@ -23,12 +23,12 @@ using velkui::pictel::ColorRGBA;
 constexpr ColorRGBA kBackground{0.93f, 0.94f, 0.96f, 1};
 constexpr ColorRGBA kGroupFill{1, 1, 1, 1};
 constexpr ColorRGBA kGroupFrame{0.78f, 0.81f, 0.86f, 1};
-struct CardSpec {
+struct CardFace {
   const char16_t* title;
   const char16_t* reading;
   ColorRGBA color;
 };
-constexpr std::array<CardSpec, 3> kCards{{
+constexpr std::array<CardFace, 3> kCards{{
     {u"Input", u"\u221212.0 dB", {0.16f, 0.45f, 0.86f, 1}},
     {u"Tempo", u"120 BPM", {0.20f, 0.62f, 0.47f, 1}},
     {u"Output", u"\u22120.3 dB", {0.90f, 0.55f, 0.18f, 1}},
@@ -80,20 +80,20 @@ class Tile : public velkui::ui::UI_SubView {
 // A card: a coloured block with a title band and a reading.
 class Card : public Tile {
  public:
-  explicit Card(const CardSpec& spec) : Tile(150, 64), spec_(spec) {}
+  explicit Card(const CardFace& face) : Tile(150, 64), face_(face) {}
 
   void UI_Draw(velkui::pictel::Pictel* context) const override {
     const RectT<float> r = UI_GetLocalRectF(false);
     auto& surface = *context->GetSurface();
-    surface.PaintRect(spec_.color, r);
-    surface.PaintRect(Darker(spec_.color), {r.left, r.top, r.width, 20});
-    Label(context, spec_.title, 8, 14, 11, true);
-    Label(context, spec_.reading, 8, 50, 18, true);
+    surface.PaintRect(face_.color, r);
+    surface.PaintRect(Darker(face_.color), {r.left, r.top, r.width, 20});
+    Label(context, face_.title, 8, 14, 11, true);
+    Label(context, face_.reading, 8, 50, 18, true);
     Tile::UI_Draw(context);
   }
 
  private:
-  CardSpec spec_;
+  CardFace face_;
 };
 
 enum class Glyph { kPlay, kStop, kRecord, kLoop, kAdd };
@@ -202,7 +202,7 @@ LayoutPanel::LayoutPanel(float width, float height) {
 
   cards_ = MakeGroup(GroupArrangementType::Flipping, 10, 8);
   cards_->EnableSeparators(true);
-  for (const CardSpec& card : kCards) cards_->ChildPushBack(velkcore::MakeIntrusive<Card>(card));
+  for (const CardFace& card : kCards) cards_->ChildPushBack(velkcore::MakeIntrusive<Card>(card));
   tools_ = MakeGroup(GroupArrangementType::HorizontalWrapping, 6, 8);
   constexpr std::array<Glyph, 5> kGlyphs{Glyph::kPlay, Glyph::kStop, Glyph::kRecord, Glyph::kLoop,
                                          Glyph::kAdd};
