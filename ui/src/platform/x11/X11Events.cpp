@@ -64,6 +64,10 @@ void X11Platform::Impl::DrainConnection() {
 
 void X11Platform::Impl::HandleEvent(XEvent& event) {
   if (clipboard.HandleEvent(event)) return;
+  if (xsettings.HandleEvent(event)) {
+    ApplyDoubleClickSettings();
+    return;
+  }
   if (randrEventBase >= 0 && event.type == randrEventBase + RRScreenChangeNotify) {
     XRRUpdateConfiguration(&event);
     DisplayChanged();

@@ -55,9 +55,14 @@ struct X11OutsideClient::Impl {
     return names;
   }
 
+  ~Impl() {
+    if (settingsWindow != None) XDestroyWindow(connection.Get(), settingsWindow);
+  }
+
   x11::X11Connection connection;
   bool xtestAvailable = false;
   bool numLockOn = false;
+  Window settingsWindow = None;
 };
 
 X11OutsideClient::X11OutsideClient(const X11Platform& platform)
@@ -102,6 +107,52 @@ void X11OutsideClient::DeleteProperty(PlatformWindow window, std::string_view na
 void X11OutsideClient::FocusWindow(PlatformWindow window) {
   Display* display = impl_->connection.Get();
   XSetInputFocus(display, window, RevertToParent, CurrentTime);
+  XSync(display, False);
+}
+
+void X11OutsideClient::PublishSettings(std::span<const std::uint8_t> property) {
+  Display* display = impl_->connection.Get();
+  const Window root = impl_->connection.Root();
+  const Atom settings = impl_->connection.Intern("_XSETTINGS_SETTINGS");
+  const bool announce = impl_->settingsWindow == None;
+  if (announce) impl_->settingsWindow = XCreateSimpleWindow(display, root, 0, 0, 1, 1, 0, 0, 0);
+  XChangeProperty(display, impl_->settingsWindow, settings, settings, 8, PropModeReplace,
+                  property.data(), static_cast<int>(property.size()));
+  if (announce) {
+    const Atom selection =
+        impl_->connection.Intern("_XSETTINGS_S" + std::to_string(impl_->connection.Screen()));
+    XSetSelectionOwner(display, selection, impl_->settingsWindow, CurrentTime);
+    XEvent message{};
+    message.xclient.type = ClientMessage;
+    message.xclient.window = root;
+    message.xclient.message_type = impl_->connection.Intern("MANAGER");
+    message.xclient.format = 32;
+    message.xclient.data.l[0] = CurrentTime;
+    message.xclient.data.l[1] = static_cast<long>(selection);
+    message.xclient.data.l[2] = static_cast<long>(impl_->settingsWindow);
+    XSendEvent(display, root, False, StructureNotifyMask, &message);
+  }
+  XSync(display, False);
+}
+
+void X11OutsideClient::WithdrawSettings() {
+  if (impl_->settingsWindow == None) return;
+  Display* display = impl_->connection.Get();
+  XDestroyWindow(display, impl_->settingsWindow);
+  impl_->settingsWindow = None;
+  XSync(display, False);
+}
+
+void X11OutsideClient::SetResources(std::string_view text) {
+  Display* display = impl_->connection.Get();
+  const Window root = impl_->connection.Root();
+  if (text.empty()) {
+    XDeleteProperty(display, root, XA_RESOURCE_MANAGER);
+  } else {
+    XChangeProperty(display, root, XA_RESOURCE_MANAGER, XA_STRING, 8, PropModeReplace,
+                    reinterpret_cast<const unsigned char*>(text.data()),
+                    static_cast<int>(text.size()));
+  }
   XSync(display, False);
 }
 

@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <memory>
+#include <span>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -52,6 +53,18 @@ class X11OutsideClient {
   // Gives the server's keyboard focus to a window, as a window manager does
   // when the user clicks it.
   void FocusWindow(PlatformWindow window);
+
+  // Plays the desktop's settings manager: owns _XSETTINGS_S<screen> with a
+  // window of its own whose _XSETTINGS_SETTINGS property holds `property` (the
+  // bytes as a manager writes them), announced to the root the first time.
+  // Called again, it replaces the property, as a manager does on a change.
+  void PublishSettings(std::span<const std::uint8_t> property);
+  // Ends the manager: its window goes, and the selection with it.
+  void WithdrawSettings();
+
+  // Replaces the resources a display hands to the connections opened after
+  // this (RESOURCE_MANAGER on the root, in Xrm's text form); empty text removes them.
+  void SetResources(std::string_view text);
 
   // Synthetic input, each sent and handled by the server before it returns.
   // The same arguments and errors as X11Platform's.

@@ -12,6 +12,7 @@
 #include <cmath>
 #include <cstdlib>
 #include <cstring>
+#include <limits>
 
 #include <velkcore/Error.h>
 
@@ -121,7 +122,11 @@ Bool IsPropertyChangeOf(Display*, XEvent* event, XPointer argument) {
 // ---- Impl: records ----
 
 X11Platform::Impl::Impl()
-    : display(connection.Get()), keyboard(display), cursors(display), clipboard(connection) {
+    : display(connection.Get()),
+      keyboard(display),
+      cursors(display),
+      clipboard(connection),
+      xsettings(connection) {
   int eventBase = 0;
   int errorBase = 0;
   if (XRRQueryExtension(display, &eventBase, &errorBase)) {
@@ -132,12 +137,15 @@ X11Platform::Impl::Impl()
   int major = 0;
   int minor = 0;
   xtestAvailable = XTestQueryExtension(display, &eventBase, &errorBase, &major, &minor) != 0;
-  // The work area and the window manager are properties of the root.
-  XSelectInput(display, connection.Root(), PropertyChangeMask);
+  // The work area and the window manager are properties of the root; a new
+  // settings manager announces itself to its StructureNotify clients.
+  XSelectInput(display, connection.Root(), PropertyChangeMask | StructureNotifyMask);
   if (const char* time = XGetDefault(display, "velkui", "multiClickTime")) {
     const long value = std::strtol(time, nullptr, 10);
-    if (value > 0) doubleClickTime = static_cast<std::uint32_t>(value);
+    if (value > 0) resourceDoubleClickTime = static_cast<std::uint32_t>(value);
   }
+  xsettings.Refresh();
+  ApplyDoubleClickSettings();
   // The lock keys as they are now.
   Window root = None;
   Window child = None;
@@ -429,6 +437,20 @@ void X11Platform::Impl::ApplyCursor() {
     XChangeActivePointerGrab(display, kGrabEvents, shape, CurrentTime);
   }
   XFlush(display);
+}
+
+void X11Platform::Impl::ApplyDoubleClickSettings() {
+  const x11::XSettings& settings = xsettings.Settings();
+  const std::optional<std::int32_t> time = settings.Integer("Net/DoubleClickTime");
+  doubleClickTime = resourceDoubleClickTime.value_or(
+      time && *time > 0 ? static_cast<std::uint32_t>(*time) : kDefaultDoubleClickTime);
+  // A distance each way from the first click: the size spans it on both sides.
+  const std::optional<std::int32_t> distance = settings.Integer("Net/DoubleClickDistance");
+  const std::int32_t size =
+      distance && *distance >= 0 && *distance <= std::numeric_limits<std::int32_t>::max() / 2
+          ? *distance * 2
+          : kDefaultDoubleClickSize;
+  doubleClickSize = {size, size};
 }
 
 // ---- X11Platform ----

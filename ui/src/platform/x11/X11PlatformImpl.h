@@ -25,6 +25,7 @@
 #include "X11Cursors.h"
 #include "X11Keyboard.h"
 #include "X11Platform.h"
+#include "XSettingsClient.h"
 
 namespace velkui::ui::x11 {
 
@@ -90,6 +91,7 @@ struct X11Platform::Impl {
   x11::X11Keyboard keyboard;
   x11::X11Cursors cursors;
   x11::X11Clipboard clipboard;
+  x11::XSettingsClient xsettings;
   platform::WindowTable<x11::WindowRecord> windows;
 
   // Top-level windows in the order they were last activated (latest last).
@@ -117,8 +119,12 @@ struct X11Platform::Impl {
     bool wasDouble = false;
   };
   std::optional<Press> lastPress;
-  std::uint32_t doubleClickTime = 500;
-  PointT<std::int32_t> doubleClickSize{4, 4};
+  static constexpr std::uint32_t kDefaultDoubleClickTime = 500;
+  static constexpr std::int32_t kDefaultDoubleClickSize = 4;
+  // The X resource velkui.multiClickTime: it wins over the desktop's setting.
+  std::optional<std::uint32_t> resourceDoubleClickTime;
+  std::uint32_t doubleClickTime = kDefaultDoubleClickTime;
+  PointT<std::int32_t> doubleClickSize{kDefaultDoubleClickSize, kDefaultDoubleClickSize};
   CursorShape cursor = CursorShape::kArrow;
   bool quitPending = false;
   std::int32_t quitCode = 0;
@@ -168,6 +174,9 @@ struct X11Platform::Impl {
                                    const PointT<std::int32_t>& eventPoint,
                                    const PointT<std::int32_t>& screen) const;
   void ApplyCursor();
+  // The double-click time and size from the resource, the desktop's settings
+  // or the defaults.
+  void ApplyDoubleClickSettings();
 
   // ---- X events (X11Events.cpp) ----
   // Reads every event the connection has and turns it into messages.
