@@ -172,6 +172,7 @@ float GroupArrangement::ExpandedMain(float available) const {
   // (it follows from the walk below) and the answer needs no descent into the children, which
   // keeps deep trees linear.
   if (!mainExpandable_ && ExpandsRegularly() && available >= minMain_) return minMain_;
+  if (expandedMainMemo_.available == available) return expandedMainMemo_.result;
   const double inner = static_cast<double>(available) - parameters_.MainMargins();
   double sum = 0;
   for (const IArrangementP& child : children_) {
@@ -179,12 +180,15 @@ float GroupArrangement::ExpandedMain(float available) const {
     if (sum >= inner) break;
   }
   const double gaps = children_.empty() ? 0.0 : static_cast<double>(children_.size() - 1);
-  return static_cast<float>(std::min(sum + parameters_.spacing * gaps, inner) +
-                            parameters_.MainMargins());
+  const auto result = static_cast<float>(std::min(sum + parameters_.spacing * gaps, inner) +
+                                         parameters_.MainMargins());
+  expandedMainMemo_ = {available, result};
+  return result;
 }
 
 float GroupArrangement::ExpandedCross(float available) const {
   if (!crossExpandable_ && ExpandsRegularly() && available >= minCross_) return minCross_;
+  if (expandedCrossMemo_.available == available) return expandedCrossMemo_.result;
   const float inner = available - parameters_.CrossMargins();
   float largest = 0;
   bool first = true;
@@ -194,7 +198,9 @@ float GroupArrangement::ExpandedCross(float available) const {
     first = false;
     if (expanded >= inner) break;
   }
-  return largest + parameters_.CrossMargins();
+  const float result = largest + parameters_.CrossMargins();
+  expandedCrossMemo_ = {available, result};
+  return result;
 }
 
 void GroupArrangement::Distribute(float innerMain, float innerCross) {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <limits>
 #include <utility>
 #include <vector>
 
@@ -103,6 +104,13 @@ class GroupArrangement : public IArrangement {
   PointF ToPoint(double main, double cross) const;
   RectF ToRect(double mainStart, double crossStart, double mainSize, double crossSize) const;
 
+  // The last answer of an expansion query. A parent's distribution and its placing often ask a
+  // child the same question; the memo saves the descent to the bottom of a growing subtree.
+  struct ExpansionMemo {
+    float available = std::numeric_limits<float>::quiet_NaN();
+    float result = 0;
+  };
+
   void Distribute(float innerMain, float innerCross);
   void ShareSpace(double& extra, bool growing);
   void PlaceSeparator(std::size_t gap, double mainPosition, double crossPosition, double crossSize);
@@ -120,6 +128,8 @@ class GroupArrangement : public IArrangement {
   float minCross_ = -1;
   mutable float bestMain_ = -1;
   mutable float bestCross_ = -1;
+  mutable ExpansionMemo expandedMainMemo_;
+  mutable ExpansionMemo expandedCrossMemo_;
   std::vector<IArrangementP> children_;
   std::vector<ISeparator*> separators_;
   std::vector<ISeparator*> hiddenSeparators_;
