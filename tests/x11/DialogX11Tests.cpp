@@ -370,6 +370,12 @@ TEST_F(X11DialogTest, TheDialogIsATransientModalWindowOfItsOwnerOnEveryRun) {
   EXPECT_EQ(before.states, (std::vector<std::string>{"_NET_WM_STATE_MODAL"}));
   EXPECT_TRUE(before.acceptsFocus);
   EXPECT_TRUE(before.closable) << "the close box is shown by default";
+  // One application to the window manager: the same group and client leader.
+  const X11OutsideClient::WindowHints ownerHints = hintsReader.ReadHints(Handle(*owner));
+  EXPECT_NE(before.clientLeader, kNoPlatformWindow);
+  EXPECT_EQ(before.group, before.clientLeader);
+  EXPECT_EQ(ownerHints.group, before.clientLeader);
+  EXPECT_EQ(ownerHints.clientLeader, before.clientLeader);
   EXPECT_NE(std::find(before.protocols.begin(), before.protocols.end(), "WM_DELETE_WINDOW"),
             before.protocols.end());
 

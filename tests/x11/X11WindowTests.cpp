@@ -127,6 +127,10 @@ TEST_F(X11WindowTest, GeometrySettersTakeEffectAtOnceAndTheServerAgrees) {
 }
 
 TEST_F(X11WindowTest, ActivationFocusAndHidingFollowTheContract) {
+  if (x11.HasWindowManager()) {
+    GTEST_SKIP() << "a window manager grants activation and minimising in its own time and by "
+                    "its own focus rules";
+  }
   OS_WindowP first = MakeWindow({10, 10, 200, 100}, kStyleOverlappedWindow);
   OS_WindowP second = MakeWindow({300, 10, 200, 100}, kStyleOverlappedWindow);
   EXPECT_EQ(x11.GetActiveWindow(), Handle(*second));

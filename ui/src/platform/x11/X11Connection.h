@@ -13,6 +13,7 @@ struct X11Atoms {
   Atom wmDeleteWindow = None;
   Atom wmState = None;
   Atom wmChangeState = None;
+  Atom wmClientLeader = None;
   Atom netWmPing = None;
   Atom netWmName = None;
   Atom netWmPid = None;

@@ -89,8 +89,12 @@ X11OutsideClient::WindowHints X11OutsideClient::ReadHints(PlatformWindow window)
   }
   if (XWMHints* wmHints = XGetWMHints(display, window)) {
     hints.acceptsFocus = (wmHints->flags & InputHint) != 0 && wmHints->input != False;
+    if ((wmHints->flags & WindowGroupHint) != 0) hints.group = wmHints->window_group;
     XFree(wmHints);
   }
+  const std::vector<long> leader =
+      ReadLongs(display, window, impl_->connection.Atoms().wmClientLeader, XA_WINDOW);
+  if (!leader.empty()) hints.clientLeader = static_cast<PlatformWindow>(leader.front());
   const std::vector<long> motif =
       ReadLongs(display, window, atoms.motifWmHints, atoms.motifWmHints);
   hints.closable = motif.size() >= 2 && (motif[0] & kMotifFunctionsFlag) != 0 &&

@@ -33,8 +33,11 @@ class X11OutsideClient {
     std::vector<std::string> states;
     // Atom names of WM_PROTOCOLS.
     std::vector<std::string> protocols;
-    // WM_HINTS: whether the window takes the keyboard focus.
+    // WM_HINTS: whether the window takes the keyboard focus, and its group.
     bool acceptsFocus = false;
+    PlatformWindow group = kNoPlatformWindow;
+    // WM_CLIENT_LEADER; kNoPlatformWindow when not set.
+    PlatformWindow clientLeader = kNoPlatformWindow;
     // _MOTIF_WM_HINTS: the close function offered (the close box).
     bool closable = false;
   };

@@ -146,6 +146,7 @@ X11Platform::Impl::Impl()
   }
   xsettings.Refresh();
   ApplyDoubleClickSettings();
+  CreateClientLeader();
   // The lock keys as they are now.
   Window root = None;
   Window child = None;
@@ -163,7 +164,19 @@ X11Platform::Impl::~Impl() {
   const std::vector<PlatformWindow> tops = windows.TopLevels();
   windows.Clear();
   for (const PlatformWindow top : tops) XDestroyWindow(display, top);
+  if (clientLeader != None) XDestroyWindow(display, clientLeader);
   XSync(display, False);
+}
+
+void X11Platform::Impl::CreateClientLeader() {
+  clientLeader = XCreateSimpleWindow(display, connection.Root(), -1, -1, 1, 1, 0, 0, 0);
+  const x11::X11Atoms& atoms = connection.Atoms();
+  XClassHint classHint{const_cast<char*>("velkui"), const_cast<char*>("Velkui")};
+  XSetClassHint(display, clientLeader, &classHint);
+  SetAtomProperty(display, clientLeader, atoms.wmClientLeader, XA_WINDOW,
+                  {static_cast<long>(clientLeader)});
+  SetAtomProperty(display, clientLeader, atoms.netWmPid, XA_CARDINAL,
+                  {static_cast<long>(getpid())});
 }
 
 RectT<std::int32_t> X11Platform::Impl::ScreenFrame(const WindowRecord& record) const {
@@ -271,7 +284,9 @@ void X11Platform::Impl::Activate(PlatformWindow handle, bool byClick, bool askSe
   }
   if (askServer) {
     ownActivationTime = Now();
-    if (connection.HasWindowManager()) {
+    // A window manager activates only the windows it manages; a pop-up that
+    // bypasses it takes the focus from us directly.
+    if (connection.HasWindowManager() && !record->overrideRedirect) {
       XEvent request{};
       request.xclient.type = ClientMessage;
       request.xclient.window = top;
@@ -599,10 +614,13 @@ PlatformWindow X11Platform::CreateWindow(const WindowCreateParams& params) {
     XSetWMProtocols(d.display, window, protocols.data(), static_cast<int>(protocols.size()));
     SetAtomProperty(d.display, window, atoms.netWmPid, XA_CARDINAL, {static_cast<long>(getpid())});
     XWMHints hints{};
-    hints.flags = InputHint | StateHint;
+    hints.flags = InputHint | StateHint | WindowGroupHint;
     hints.input = (params.exStyle & kExStyleNoActivate) != 0 ? False : True;
     hints.initial_state = NormalState;
+    hints.window_group = d.clientLeader;
     XSetWMHints(d.display, window, &hints);
+    SetAtomProperty(d.display, window, atoms.wmClientLeader, XA_WINDOW,
+                    {static_cast<long>(d.clientLeader)});
     if (params.parent != kNoPlatformWindow) {
       XSetTransientForHint(d.display, window, d.windows.TopLevelOf(params.parent));
     }

@@ -103,6 +103,10 @@ struct X11Platform::Impl {
   PlatformWindow focus = kNoPlatformWindow;
   PlatformWindow active = kNoPlatformWindow;
   PlatformWindow hover = kNoPlatformWindow;
+  // The unmapped window that names our windows as one application (ICCCM
+  // client leader and window group), so window managers focus and stack them
+  // together.
+  Window clientLeader = None;
   bool applicationActive = false;
   // When we last asked for activation ourselves (the focus may lag behind).
   double ownActivationTime = -1.0;
@@ -177,6 +181,7 @@ struct X11Platform::Impl {
   // The double-click time and size from the resource, the desktop's settings
   // or the defaults.
   void ApplyDoubleClickSettings();
+  void CreateClientLeader();
 
   // ---- X events (X11Events.cpp) ----
   // Reads every event the connection has and turns it into messages.
