@@ -160,6 +160,34 @@ TEST_F(X11WindowTest, ActivationFocusAndHidingFollowTheContract) {
   EXPECT_EQ(x11.GetWindowFromPoint(Screen(*second, 20, 20)), Handle(*second));
 }
 
+TEST_F(X11WindowTest, UnderAWindowManagerAWindowOpenedAfterAClickBecomesActive) {
+  if (!x11.HasWindowManager()) GTEST_SKIP() << "needs a window manager";
+  OS_WindowP first = MakeWindow({10, 10, 200, 100}, kStyleOverlappedWindow);
+  ASSERT_TRUE(PumpUntil([&] { return x11.GetActiveWindow() == Handle(*first); }));
+  Click(*first, 50, 50);
+  PumpFor(0.1);
+  OS_WindowP second = MakeWindow({300, 10, 200, 100}, kStyleOverlappedWindow);
+  EXPECT_TRUE(PumpUntil([&] { return x11.GetActiveWindow() == Handle(*second); }));
+  PumpFor(0.3);
+  EXPECT_EQ(x11.GetActiveWindow(), Handle(*second));
+  EXPECT_EQ(x11.GetFocus(), Handle(*second));
+  // Activated again by the program after the user's click: the window manager agrees.
+  Click(*second, 50, 50);
+  PumpFor(0.1);
+  x11.ActivateWindow(Handle(*first), false);
+  PumpFor(0.3);
+  EXPECT_EQ(x11.GetActiveWindow(), Handle(*first));
+  EXPECT_EQ(x11.GetFocus(), Handle(*first));
+  // Minimised by the window manager in its own time; the window comes back.
+  x11.MinimizeWindow(Handle(*first), true);
+  EXPECT_TRUE(PumpUntil([&] { return x11.GetActiveWindow() != Handle(*first); }));
+  x11.MinimizeWindow(Handle(*first), false);
+  EXPECT_TRUE(PumpUntil([&] {
+    x11.Sync();
+    return x11.GetWindowFromPoint(Screen(*first, 20, 20)) == Handle(*first);
+  }));
+}
+
 TEST_F(X11WindowTest, TransparentCornersOfAPopupAreCutOutOfItsShape) {
   WindowCreateParams params;
   params.style = kStylePopup | kStyleVisible;

@@ -323,6 +323,12 @@ void X11Platform::Impl::ReadFrameExtentsOf(Window window, x11::Insets& frame) {
   if (data != nullptr) XFree(data);
 }
 
+namespace {
+// How long after a restore the window manager's late iconify still counts as
+// the one we asked for before it.
+constexpr double kIconifyRaceSeconds = 2.0;
+}  // namespace
+
 void X11Platform::Impl::ReadWindowState(WindowRecord& record) {
   Atom type = None;
   int format = 0;
@@ -334,7 +340,18 @@ void X11Platform::Impl::ReadWindowState(WindowRecord& record) {
                          &count, &after, &data) == Success &&
       data != nullptr && format == 32 && count >= 1) {
     const long state = reinterpret_cast<const long*>(data)[0];
-    if (state == IconicState && !record.minimized) {
+    // Late enough, the iconify is the user's own (a window manager that
+    // ignored ours may act on the user's button).
+    const bool undoIconify = state == IconicState && record.iconifyPending &&
+                             record.restoredWhileIconifying >= 0 &&
+                             Now() - record.restoredWhileIconifying < kIconifyRaceSeconds;
+    if (state == IconicState) {
+      record.iconifyPending = false;
+      record.restoredWhileIconifying = -1.0;
+    }
+    if (undoIconify) {
+      if (record.visible && !record.minimized) XMapRaised(display, record.handle);
+    } else if (state == IconicState && !record.minimized) {
       record.minimized = true;
       if (active == record.handle) ActivateNextAfter(record.handle);
     } else if (state == NormalState && record.minimized) {

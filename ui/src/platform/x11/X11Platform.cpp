@@ -792,12 +792,16 @@ void X11Platform::MinimizeWindow(PlatformWindow window, bool minimize) {
       // Without a window manager nobody would act on the iconify request.
       if (d.connection.HasWindowManager() && !record->overrideRedirect) {
         XIconifyWindow(d.display, window, d.connection.Screen());
+        record->iconifyPending = true;
+        record->restoredWhileIconifying = -1.0;
       } else {
         XUnmapWindow(d.display, window);
       }
     }
     d.ActivateNextAfter(window);
   } else {
+    // A restore that overtakes the window manager's iconify would be undone by it.
+    record->restoredWhileIconifying = record->iconifyPending ? d.Now() : -1.0;
     if (record->visible) XMapRaised(d.display, window);
     AddPendingArea(*record, nullptr);
   }

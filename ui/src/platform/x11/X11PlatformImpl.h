@@ -52,6 +52,11 @@ struct WindowRecord : platform::WindowRecordBase {
   InputContext inputContext;
   // Client rectangles asked of the server whose ConfigureNotify has not come back.
   std::deque<RectT<std::int32_t>> configureRequests;
+  // An iconify request the window manager has not acted on yet, and when the
+  // window was restored meanwhile (< 0: it was not); such a window is mapped
+  // again when it turns iconic soon after.
+  bool iconifyPending = false;
+  double restoredWhileIconifying = -1.0;
 };
 
 // One message of the queue, with what the backend needs to know when it is taken.
